@@ -1,0 +1,60 @@
+# Every target does its own set-up: missing packages are installed, the build is configured.
+.PHONY: all deps build test test-asan run bench fuzz fuzz-ci format clean
+
+JOBS ?= $(shell nproc)
+EXAMPLE ?= examples/estuary.setup
+
+all: build
+
+deps:
+	@./scripts/install-deps
+
+build/default/build.ninja: | deps
+	cmake --preset default
+
+build: build/default/build.ninja
+	cmake --build --preset default -j $(JOBS)
+
+test: build
+	ctest --preset default
+
+build/asan/build.ninja: | deps
+	cmake --preset asan
+
+test-asan: build/asan/build.ninja
+	cmake --build --preset asan -j $(JOBS)
+	ctest --preset asan
+
+run: build
+	@if [ -x build/default/mudsetup-editor ]; then \
+	  build/default/mudsetup-editor $(EXAMPLE); \
+	else \
+	  build/default/mudsetup show $(EXAMPLE); \
+	fi
+
+build/release/build.ninja: | deps
+	cmake --preset release
+
+bench: build/release/build.ninja
+	cmake --build --preset release -j $(JOBS)
+	build/release/bench/paramfile_bench
+
+build/fuzz/build.ninja: | deps
+	cmake --preset fuzz
+
+fuzz: build/fuzz/build.ninja
+	cmake --build --preset fuzz -j $(JOBS)
+	mkdir -p build/fuzz/corpus
+	build/fuzz/fuzz/paramfile_fuzz build/fuzz/corpus fuzz/corpus
+
+# A short, bounded run for CI.
+fuzz-ci: build/fuzz/build.ninja
+	cmake --build --preset fuzz -j $(JOBS)
+	mkdir -p build/fuzz/corpus
+	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus fuzz/corpus
+
+format:
+	git ls-files '*.cpp' '*.h' | xargs clang-format -i
+
+clean:
+	rm -rf build
