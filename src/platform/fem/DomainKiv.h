@@ -1,0 +1,55 @@
+#pragma once
+
+#include "FemNotifier.h"
+#include "setupeditor/ZoSEKivBase.h"
+
+struct MeshInfo {
+    double xMin = 0, xMax = 0, yMin = 0, yMax = 0, zMin = 0, zMax = 0;
+};
+
+// The model domain ("Domain"): the mesh (present or not, its extent), whether the model is
+// three-dimensional with its vertical layers, and the map projection. Listeners are told
+// when it changes.
+class CDomainKiv : public CZoSEKivBase, public CFemNotifier {
+public:
+    enum Message { kMeshChanged = 10, kLayersChanged = 11 };
+
+    explicit CDomainKiv(CZoSEKivBase* parent);
+    ~CDomainKiv() override;
+
+    bool MeshExist() const { return !m_meshFile.empty(); }
+    const CString& MeshFile() const { return m_meshFile; }
+    void MeshFile(const CString& file) { m_meshFile = file; }
+    MeshInfo GetMeshInfo() const;
+    void SetMeshInfo(const MeshInfo& info);
+    bool Is3D() const { return m_threeDimensional; }
+    void Is3D(bool value) { m_threeDimensional = value; }
+    // 1: sigma layers only; 2: sigma and z layers.
+    int VerticalKind() const { return m_verticalKind; }
+    void VerticalKind(int kind) { m_verticalKind = kind; }
+    int LayerCount1() const { return m_layers1; }
+    void LayerCount1(int n) { m_layers1 = n; }
+    int LayerCount2() const { return m_layers2; }
+    void LayerCount2(int n) { m_layers2 = n; }
+    // The first count alone for vertical kind 1, else both together.
+    int LayerTotNum() const { return m_verticalKind == 1 ? m_layers1 : m_layers1 + m_layers2; }
+    const CString& Projection() const { return m_projection; }
+    void Projection(const CString& p) { m_projection = p; }
+
+    void WriteData(void* h) override;
+    void ReadData(void* h) override;
+    int ValidateData() override;
+    void SetDefault() override;
+
+private:
+    friend struct DomainFields;
+    CString m_meshFile;
+    double m_xMin = 0, m_xMax = 0, m_yMin = 0, m_yMax = 0, m_zMin = 0, m_zMax = 0;
+    bool m_threeDimensional = false;
+    int m_verticalKind = 1;
+    int m_layers1 = 0;
+    int m_layers2 = 0;
+    CString m_projection;
+};
+
+CDomainKiv* Domain(const CZoSEKivBase* node);

@@ -1,0 +1,115 @@
+#include "FemInDataKiv.h"
+
+#include "paramfile/Kiv.h"
+
+CString CFemInDataFile::ItemString() const {
+    if (!m_itemName.empty())
+        return m_itemName;
+    CString s;
+    for (int n : m_items) {
+        if (!s.empty())
+            s += ", ";
+        s += std::to_string(n);
+    }
+    return s;
+}
+
+CFemInDataKiv::CFemInDataKiv(const CString& sectionName, const CString& title, int formatCode,
+                             bool flag1, bool flag2, double defaultConstant, long itemType,
+                             CZoSEKivBase* parent)
+    : CZoSEKivBase(title, sectionName, parent), m_formatCode(formatCode), m_flag1(flag1),
+      m_flag2(flag2), m_default(defaultConstant), m_constant(defaultConstant),
+      m_itemType(itemType) {}
+
+std::vector<int> CFemInDataKiv::AllowedFormats() const {
+    std::vector<int> formats{0};
+    // Every non-empty combination of the code's bits, in increasing order.
+    for (int f = 1; f <= m_formatCode; ++f)
+        if ((f & m_formatCode) == f)
+            formats.push_back(f);
+    return formats;
+}
+
+CString CFemInDataKiv::FormatName(int format) {
+    if (format == 0)
+        return "Constant";
+    CString parts;
+    auto add = [&](const char* part) {
+        if (!parts.empty())
+            parts += " and ";
+        parts += part;
+    };
+    if (format & 1)
+        add("time");
+    if (format & 2)
+        add("domain");
+    if (format & 8)
+        add("vertical");
+    if (parts.empty())
+        return FormatString("Format %d", format);
+    return "Varying in " + parts;
+}
+
+CString CFemInDataKiv::FormatText() const {
+    if (m_format == 0)
+        return FormatName(0);
+    return FormatName(m_format) + ": " + m_file.FileName();
+}
+
+void CFemInDataKiv::WriteData(void* h) {
+    kivPutParam(h, "format", m_format);
+    kivPutParam(h, "constant_value", m_constant);
+    kivPutParamFilename(h, "file_name", m_file.FileName());
+    kivAddKeyword(h, "item_numbers");
+    for (int n : m_file.ItemNumbers())
+        kivAddInt(h, n);
+    kivPutParam(h, "item_name", m_file.ItemName());
+}
+
+void CFemInDataKiv::ReadData(void* h) {
+    kivGetParam(h, "format", &m_format, 1, 1);
+    kivGetParam(h, "constant_value", &m_constant, 1, 1);
+    CString name = m_file.FileName();
+    kivGetParamFilename(h, "file_name", &name, 1, 1);
+    m_file.FileName(name);
+    if (void* k = kivKeywordByNameNum(h, "item_numbers", 1)) {
+        std::vector<int> items;
+        const int n = kivParamCount(k);
+        for (int i = 1; i <= n; ++i) {
+            int item = m_file.ItemNumbers().empty() ? 1 : m_file.ItemNumbers().front();
+            kivGetParam(h, "item_numbers", &item, 1, i);
+            items.push_back(item);
+        }
+        m_file.ItemNumbers(std::move(items));
+    }
+    CString itemName = m_file.ItemName();
+    kivGetParam(h, "item_name", &itemName, 1, 1);
+    m_file.ItemName(itemName);
+}
+
+int CFemInDataKiv::ValidateData() {
+    if (m_disabled || m_format == 0)
+        return 1;
+    const CString what = GetTitle().empty() ? CString("the value") : "'" + GetTitle() + "'";
+    if (m_file.FileName().empty()) {
+        AddError("No data file is given for " + what);
+        return 0;
+    }
+    if (m_file.ItemNumbers().empty()) {
+        AddError("No item of the data file is chosen for " + what);
+        return 0;
+    }
+    for (int n : m_file.ItemNumbers())
+        if (n < 1) {
+            AddError(FormatString("Item number %d of the data file for %s is not valid", n,
+                                  what.c_str()));
+            return 0;
+        }
+    return 1;
+}
+
+void CFemInDataKiv::SetDefault() {
+    m_format = 0;
+    m_constant = m_default;
+    m_file = CFemInDataFile();
+}

@@ -1,0 +1,76 @@
+// A data-input value: either a constant or a data file with the item numbers to read.
+#pragma once
+
+#include "setupeditor/ZoSEKivBase.h"
+
+#include <vector>
+
+// The data file of a data-input value.
+class CFemInDataFile {
+public:
+    const CString& FileName() const { return m_fileName; }
+    void FileName(const CString& name) { m_fileName = name; }
+    const std::vector<int>& ItemNumbers() const { return m_items; }
+    void ItemNumbers(std::vector<int> items) { m_items = std::move(items); }
+    const CString& ItemName() const { return m_itemName; }
+    void ItemName(const CString& name) { m_itemName = name; }
+    // The item's name where one is known, else its numbers ("1, 3").
+    CString ItemString() const;
+
+private:
+    CString m_fileName;
+    std::vector<int> m_items{1};
+    CString m_itemName;
+};
+
+// Format values: 0 a constant; otherwise a data file whose values vary in time (1), over
+// the horizontal domain (2) or over the vertical (8), or in a combination of these bits.
+// The format code given at construction is the set of those bits the value may use.
+class CFemInDataKiv : public CZoSEKivBase {
+public:
+    CFemInDataKiv(const CString& sectionName, const CString& title, int formatCode, bool flag1,
+                  bool flag2, double defaultConstant, long itemType, CZoSEKivBase* parent);
+
+    double Constant() const { return m_constant; }
+    void Constant(double value) { m_constant = value; }
+    double DefaultConstant() const { return m_default; }
+    int Format() const { return m_format; }
+    void Format(int format) { m_format = format; }
+    int FormatCode() const { return m_formatCode; }
+    void FormatCode(int code) { m_formatCode = code; }
+    bool IsDisabled() const { return m_disabled; }
+    void Disable(bool disabled) { m_disabled = disabled; }
+    int Type() const { return m_type; }
+    void Type(int type) { m_type = type; }
+    long ItemType() const { return m_itemType; }
+    std::vector<long>& FurtherItemTypes() { return m_furtherItemTypes; }
+    bool Flag1() const { return m_flag1; }
+    bool Flag2() const { return m_flag2; }
+    CFemInDataFile* QrdData() { return &m_file; }
+    const CFemInDataFile* QrdData() const { return &m_file; }
+
+    // The formats this value may take, constant first.
+    std::vector<int> AllowedFormats() const;
+    static CString FormatName(int format);
+    // One line for grids: "Constant" or the kind of variation.
+    CString FormatText() const;
+
+    void WriteData(void* h) override;
+    void ReadData(void* h) override;
+    int ValidateData() override;
+    void SetDefault() override;
+    bool IsDlgUsedInSetup() override { return !m_disabled; }
+
+private:
+    int m_formatCode;
+    int m_format = 0;
+    bool m_flag1;
+    bool m_flag2;
+    double m_default;
+    double m_constant;
+    long m_itemType;
+    std::vector<long> m_furtherItemTypes;
+    bool m_disabled = false;
+    int m_type = 0;
+    CFemInDataFile m_file;
+};

@@ -1,0 +1,64 @@
+// The host's document: the host's own nodes and the mud-transport module, read from and
+// written to one setup file. Top-level sections that neither owns are kept as read.
+#pragma once
+
+#include "paramfile/ParamFile.h"
+#include "setupeditor/ZoSEKivBase.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+class CMudTransportModuleKiv;
+class CModuleSelection;
+class CDomainKiv;
+class CSimulationPeriodKiv;
+class CHDDensityKiv;
+
+class CSetupDocument : public CZoSEKivGlobalBase {
+public:
+    // A new setup with every default.
+    CSetupDocument();
+    ~CSetupDocument() override;
+
+    struct OpenResult {
+        std::unique_ptr<CSetupDocument> document;      // null when error is set
+        std::optional<paramfile::Diagnostic> error;    // unreadable file or syntax error
+        std::vector<paramfile::Diagnostic> warnings;   // values that could not be used
+    };
+    static OpenResult Open(const std::string& path);
+    static OpenResult FromText(std::string text, const std::string& fileName);
+
+    // The whole setup in its canonical form.
+    std::string ToText();
+    // Atomic: on failure the file on disk and this document stay as they were.
+    bool SaveAs(const std::string& path, std::string* error);
+
+    // Clears the error list and validates the host's nodes and, when it is in use, the module.
+    int ValidateAll();
+
+    const std::string& FileName() const { return m_fileName; }
+    CMudTransportModuleKiv* Module() const { return m_module; }
+    CModuleSelection* GetModuleSelection() const { return m_moduleSelection; }
+    CDomainKiv* GetDomain() const { return m_domain; }
+    CSimulationPeriodKiv* GetPeriod() const { return m_period; }
+    CHDDensityKiv* GetDensity() const { return m_density; }
+
+private:
+    template <class T>
+    T* AddHostNode(T* node) {
+        AddChild(node);
+        return node;
+    }
+    static OpenResult FromParsed(paramfile::ParseResult parsed, const std::string& fileName);
+
+    std::string m_fileName;
+    // What was read, for the top-level sections that are kept as they were.
+    std::unique_ptr<paramfile::Document> m_source;
+    CMudTransportModuleKiv* m_module = nullptr;
+    CModuleSelection* m_moduleSelection = nullptr;
+    CDomainKiv* m_domain = nullptr;
+    CSimulationPeriodKiv* m_period = nullptr;
+    CHDDensityKiv* m_density = nullptr;
+};

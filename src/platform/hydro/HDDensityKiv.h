@@ -1,0 +1,23 @@
+#pragma once
+
+#include "setupeditor/ZoSEKivBase.h"
+
+// The hydrodynamic density mode ("HDDensity"): 0 barotropic; above 0 the density varies
+// (with salinity, temperature or both).
+class CHDDensityKiv : public CZoSEKivBase {
+public:
+    explicit CHDDensityKiv(CZoSEKivBase* parent);
+    ~CHDDensityKiv() override;
+
+    int DensityMode() const { return m_mode; }
+    void DensityMode(int mode) { m_mode = mode; }
+
+    void WriteData(void* h) override;
+    void ReadData(void* h) override;
+    void SetDefault() override { m_mode = 0; }
+
+private:
+    int m_mode = 0;
+};
+
+CHDDensityKiv* HDDensity(const CZoSEKivBase* node);

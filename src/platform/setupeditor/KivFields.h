@@ -1,0 +1,128 @@
+// A section's plain keywords declared once, in file order, with their defaults: the table
+// drives writing, reading and resetting, so the three can never disagree.
+//
+//   static const KivField<CMyKiv> kFields[] = {
+//       KivField<CMyKiv>::Int("flocculation_description", &CMyKiv::m_floc, 1),
+//       KivField<CMyKiv>::Double("rho_sediment", &CMyKiv::m_rho, 2650.0),
+//   };
+//   WriteFields(h, *this, kFields); ReadFields(h, *this, kFields); DefaultFields(*this, kFields);
+#pragma once
+
+#include "common/Platform.h"
+#include "paramfile/Kiv.h"
+
+#include <cstddef>
+
+template <class O>
+struct KivField {
+    enum class Kind { Int, Double, Float, Bool, Flag, String, FileName };
+
+    const char* keyword;
+    Kind kind;
+    int O::*intMember = nullptr;
+    double O::*doubleMember = nullptr;
+    float O::*floatMember = nullptr;
+    bool O::*boolMember = nullptr;
+    CString O::*stringMember = nullptr;
+    double numericDefault = 0.0;
+    const char* stringDefault = "";
+
+    static KivField Int(const char* kw, int O::*m, int def) {
+        KivField f{kw, Kind::Int};
+        f.intMember = m;
+        f.numericDefault = def;
+        return f;
+    }
+    static KivField Double(const char* kw, double O::*m, double def) {
+        KivField f{kw, Kind::Double};
+        f.doubleMember = m;
+        f.numericDefault = def;
+        return f;
+    }
+    static KivField Float(const char* kw, float O::*m, float def) {
+        KivField f{kw, Kind::Float};
+        f.floatMember = m;
+        f.numericDefault = def;
+        return f;
+    }
+    // true / false in the file.
+    static KivField Bool(const char* kw, bool O::*m, bool def) {
+        KivField f{kw, Kind::Bool};
+        f.boolMember = m;
+        f.numericDefault = def ? 1 : 0;
+        return f;
+    }
+    // An integer 1 or 0 in the file, read as true exactly when it is 1.
+    static KivField Flag(const char* kw, bool O::*m, bool def) {
+        KivField f{kw, Kind::Flag};
+        f.boolMember = m;
+        f.numericDefault = def ? 1 : 0;
+        return f;
+    }
+    static KivField String(const char* kw, CString O::*m, const char* def) {
+        KivField f{kw, Kind::String};
+        f.stringMember = m;
+        f.stringDefault = def;
+        return f;
+    }
+    static KivField FileName(const char* kw, CString O::*m, const char* def) {
+        KivField f{kw, Kind::FileName};
+        f.stringMember = m;
+        f.stringDefault = def;
+        return f;
+    }
+};
+
+template <class O, size_t N>
+void WriteFields(void* h, const O& o, const KivField<O> (&fields)[N]) {
+    using K = typename KivField<O>::Kind;
+    for (const KivField<O>& f : fields) {
+        switch (f.kind) {
+        case K::Int: kivPutParam(h, f.keyword, o.*f.intMember); break;
+        case K::Double: kivPutParam(h, f.keyword, o.*f.doubleMember); break;
+        case K::Float: kivPutParam(h, f.keyword, o.*f.floatMember); break;
+        case K::Bool: kivPutParam(h, f.keyword, o.*f.boolMember); break;
+        case K::Flag: kivPutParam(h, f.keyword, (o.*f.boolMember) ? 1 : 0); break;
+        case K::String: kivPutParam(h, f.keyword, o.*f.stringMember); break;
+        case K::FileName: kivPutParamFilename(h, f.keyword, o.*f.stringMember); break;
+        }
+    }
+}
+
+// A missing keyword keeps the value the field holds.
+template <class O, size_t N>
+void ReadFields(void* h, O& o, const KivField<O> (&fields)[N]) {
+    using K = typename KivField<O>::Kind;
+    for (const KivField<O>& f : fields) {
+        switch (f.kind) {
+        case K::Int: kivGetParam(h, f.keyword, &(o.*f.intMember), 1, 1); break;
+        case K::Double: kivGetParam(h, f.keyword, &(o.*f.doubleMember), 1, 1); break;
+        case K::Float: kivGetParam(h, f.keyword, &(o.*f.floatMember), 1, 1); break;
+        case K::Bool: kivGetParam(h, f.keyword, &(o.*f.boolMember), 1, 1); break;
+        case K::Flag: {
+            int v = (o.*f.boolMember) ? 1 : 0;
+            kivGetParam(h, f.keyword, &v, 1, 1);
+            o.*f.boolMember = (v == 1);
+            break;
+        }
+        case K::String: kivGetParam(h, f.keyword, &(o.*f.stringMember), 1, 1); break;
+        case K::FileName: kivGetParamFilename(h, f.keyword, &(o.*f.stringMember), 1, 1); break;
+        }
+    }
+}
+
+template <class O, size_t N>
+void DefaultFields(O& o, const KivField<O> (&fields)[N]) {
+    using K = typename KivField<O>::Kind;
+    for (const KivField<O>& f : fields) {
+        switch (f.kind) {
+        case K::Int: o.*f.intMember = static_cast<int>(f.numericDefault); break;
+        case K::Double: o.*f.doubleMember = f.numericDefault; break;
+        case K::Float: o.*f.floatMember = static_cast<float>(f.numericDefault); break;
+        case K::Bool:
+        case K::Flag: o.*f.boolMember = f.numericDefault != 0; break;
+        case K::String:
+        case K::FileName: o.*f.stringMember = f.stringDefault; break;
+        }
+    }
+}
