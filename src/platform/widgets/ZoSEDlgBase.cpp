@@ -1,0 +1,56 @@
+#include "ZoSEDlgBase.h"
+
+#include <map>
+#include <string>
+
+namespace {
+std::map<std::string, DialogFactory>& Factories() {
+    static std::map<std::string, DialogFactory> factories;
+    return factories;
+}
+}  // namespace
+
+bool RegisterDialogClass(const char* className, DialogFactory factory) {
+    Factories()[className] = std::move(factory);
+    return true;
+}
+
+CZoSEDlgBase* CreateDialogFromClass(const char* className) {
+    if (!className)
+        return nullptr;
+    auto it = Factories().find(className);
+    return it == Factories().end() ? nullptr : it->second();
+}
+
+bool IsDialogClassRegistered(const char* className) {
+    return className && Factories().count(className) > 0;
+}
+
+CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {}
+
+CZoSEDlgBase::~CZoSEDlgBase() = default;
+
+void CZoSEDlgBase::Attach(CZoSEKivBase* node, CDialogHost* host) {
+    m_node = node;
+    m_host = host;
+}
+
+void CZoSEDlgBase::Initialize() { SetData(); }
+
+void CZoSEDlgBase::SetData() {}
+
+void CZoSEDlgBase::UpdateDoc(int hint) {
+    if (m_node)
+        m_node->SetHasBeenTouched(true);
+    if (m_host)
+        m_host->UpdateDoc(this, hint);
+}
+
+void CZoSEDlgBase::ShowHelp() {
+    if (m_host)
+        m_host->ShowHelp(GetHelpID());
+}
+
+void CZoSEDlgBase::AddAlignRight(QWidget*) {}
+
+void CZoSEDlgBase::HideCaption(int) {}

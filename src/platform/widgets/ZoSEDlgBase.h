@@ -1,0 +1,75 @@
+// Section dialogs: a form bound to one node. The editor (or a test) is the dialog's host:
+// it receives the update hints, selects tree items and shows help.
+#pragma once
+
+#include "fem/FemHelpBase.h"
+#include "setupeditor/ZoSEKivBase.h"
+
+#include <QWidget>
+
+#include <functional>
+
+class CZoSEDlgBase;
+
+// Update hints: what changed in the node.
+enum UpdateHint : int {
+    kHintValueChanged = 1,
+    kHintItemsAdded = 2,
+    kHintItemsDeleted = 4,
+    kHintTitleChanged = 8,
+    kHintItemsReordered = 16,
+};
+
+class CDialogHost {
+public:
+    virtual ~CDialogHost() = default;
+    // The node of the dialog changed; the host refreshes its views (and the dialog's SetData).
+    virtual void UpdateDoc(CZoSEDlgBase* dialog, int hint) = 0;
+    virtual void SelectTreeItem(CZoSEKivBase* node) = 0;
+    virtual void ShowHelp(unsigned long helpId) = 0;
+    // A path relative to the setup file made absolute (unchanged when already absolute).
+    virtual CString AbsoluteFilePath(const CString& path) = 0;
+};
+
+class CZoSEDlgBase : public QWidget, public CFemHelpBase {
+    Q_OBJECT
+public:
+    explicit CZoSEDlgBase(QWidget* parent = nullptr);
+    ~CZoSEDlgBase() override;
+
+    // Binds the dialog to its node and host; Initialize follows.
+    void Attach(CZoSEKivBase* node, CDialogHost* host);
+    CZoSEKivBase* GetSection() const { return m_node; }
+    template <class T>
+    T* Section() const {
+        return dynamic_cast<T*>(m_node);
+    }
+    CDialogHost* Host() const { return m_host; }
+
+    // One-time set-up; overrides build their controls, then call the base last.
+    virtual void Initialize();
+    // Fills the controls from the node and applies the enabling rules.
+    virtual void SetData();
+    // Tells the host that the node changed; the node counts as touched from then on.
+    void UpdateDoc(int hint);
+    // The help command: shows the topic of the dialog's help id.
+    void ShowHelp();
+    // Layout helpers of the framework; Qt layouts do the work.
+    void AddAlignRight(QWidget* widget);
+    void HideCaption(int hide);
+
+protected:
+    CZoSEKivBase* m_node = nullptr;
+    CDialogHost* m_host = nullptr;
+};
+
+// Dialogs are created from the class name a node answers to GetDlgRuntimeClass(2555).
+using DialogFactory = std::function<CZoSEDlgBase*()>;
+bool RegisterDialogClass(const char* className, DialogFactory factory);
+CZoSEDlgBase* CreateDialogFromClass(const char* className);  // null for unknown names
+bool IsDialogClassRegistered(const char* className);
+
+// In the dialog's .cpp: makes the class creatable from its name.
+#define IMPLEMENT_DYNCREATE_DLG(cls)                                                         \
+    [[maybe_unused]] static const bool cls##_dyncreate =                                     \
+        RegisterDialogClass(#cls, []() -> CZoSEDlgBase* { return new cls; });
