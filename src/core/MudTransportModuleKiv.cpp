@@ -7,6 +7,7 @@
 #include "bed/MTBedGroupKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
+#include "watercolumn/MTDispersionKiv.h"
 
 namespace {
 const char* const kKey = "MudTransportBase";
@@ -21,6 +22,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTWaterColumnKiv(this));
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
+    AddChild(new CMTDispersionKiv(this));
 }
 
 CMudTransportModuleKiv::~CMudTransportModuleKiv() { GetRoot()->UnregisterImportantNode(kKey); }
