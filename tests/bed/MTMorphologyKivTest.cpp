@@ -27,8 +27,9 @@ TEST(MTMorphologyKiv, NewSetupWritesThreeKeywordsAfterTheBedAndForcings) {
     EXPECT_LT(at("[BED]"), at("[FORCINGS]"));
     EXPECT_LT(at("[FORCINGS]"), at("[MORPHOLOGY]"));
     EXPECT_LT(at("[MORPHOLOGY]"), static_cast<long>(entries.size()));
-    if (at("[OUTPUTS]") < static_cast<long>(entries.size()))
+    if (at("[OUTPUTS]") < static_cast<long>(entries.size())) {
         EXPECT_LT(at("[MORPHOLOGY]"), at("[OUTPUTS]"));
+    }
 
     const paramfile::Section* morphology = root->FindSection("MORPHOLOGY");
     ASSERT_NE(morphology, nullptr);
