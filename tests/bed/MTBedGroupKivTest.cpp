@@ -94,9 +94,6 @@ MUD_TRANSPORT_MODULE {
 TEST(MTBedRoughnessKiv, NegativeConstantFailsWhateverTheFormat) {
     auto doc = NewSetup(1);
     CMTBedRoughnessKiv* roughness = Roughness(*doc);
-    EXPECT_STREQ(roughness->GetDlgRuntimeClass(2555), "CMTBedRoughnessDlg");
-    EXPECT_EQ(roughness->GetDlgRuntimeClass(1), nullptr);
-    EXPECT_EQ(roughness->GetTitle(), "Bed Roughness");
 
     roughness->Roughness()->Constant(0.0);
     EXPECT_EQ(doc->ValidateAll(), 1);
@@ -131,6 +128,32 @@ MUD_TRANSPORT_MODULE {
               (std::vector<std::string>{kRoughnessMessage}));
     Roughness(*doc)->Roughness()->Constant(std::numeric_limits<double>::infinity());
     EXPECT_EQ(doc->ValidateAll(), 1);
+}
+
+TEST(MTBedGroupKiv, EveryNodeNamesItsDialog) {
+    auto doc = NewSetup(2);
+    CMTBedGroupKiv* bed = Node<CMTBedGroupKiv>(*doc, {"BED"});
+    const struct {
+        CZoSEKivBase* node;
+        const char* title;
+        const char* dialog;
+    } expected[] = {
+        {bed->Erosion(), "Erosion", "CMTErosionListDlg"},
+        {bed->Erosion()->GetItem(2), "Layer 2", "CMTErosionItemDlg"},
+        {bed->Density(), "Density of Bed Layer", "CMTDensityListDlg"},
+        {bed->Density()->GetItem(2), "Layer 2", "CMTDensityItemDlg"},
+        {bed->Roughness(), "Bed Roughness", "CMTBedRoughnessDlg"},
+        {bed->Transition(), "Transition Between Layers", "CMTTransitionListDlg"},
+        {bed->Transition()->GetItem(1), "Between layer 1 and 2", "CMTTransitionItemDlg"},
+        {Node<CZoSEKivBase>(*doc, {"MORPHOLOGY"}), "Morphology", "CMTMorphologyDlg"},
+    };
+    for (const auto& e : expected) {
+        SCOPED_TRACE(e.dialog);
+        EXPECT_EQ(e.node->GetTitle(), e.title);
+        ASSERT_NE(e.node->GetDlgRuntimeClass(2555), nullptr);
+        EXPECT_STREQ(e.node->GetDlgRuntimeClass(2555), e.dialog);
+        EXPECT_EQ(e.node->GetDlgRuntimeClass(2554), nullptr);
+    }
 }
 
 TEST(MTBedGroupKiv, NewSetupValidatesWithoutBedMessages) {

@@ -53,16 +53,6 @@ TEST(MTDensityListKiv, LayerDefaultsFollowTheNumberOfLayers) {
               (std::vector<double>{180.0, 300.0, 450.0, 600.0, 600.0}));
 }
 
-TEST(MTDensityListKiv, ZeroLayersLeaveOnlyTheCount) {
-    auto doc = Load("MUD_TRANSPORT_MODULE {\n MODEL_DEFINITION {\n number_of_layers = 0\n }\n}\n");
-    auto saved = Saved(*doc);
-    const paramfile::Section* density =
-        Find(*saved, {"MUD_TRANSPORT_MODULE", "BED", "BED_DENSITY"});
-    ASSERT_NE(density, nullptr);
-    EXPECT_EQ(Entries(*density), (std::vector<std::string>{"ZoSEKivListItemCount"}));
-    EXPECT_EQ(Int(*density, "ZoSEKivListItemCount"), 0);
-}
-
 TEST(MTDensityListKiv, ValuesAndDataFilesSurviveSaveAndLoad) {
     auto doc = NewSetup(2);
     CMTDensityListKiv* list = Density(*doc);
@@ -81,14 +71,4 @@ TEST(MTDensityListKiv, ValuesAndDataFilesSurviveSaveAndLoad) {
     EXPECT_EQ(read->GetItem(2)->Density()->Format(), 2);
     EXPECT_EQ(read->GetItem(2)->Density()->QrdData()->FileName(), "bed\\density.qrd2");
     EXPECT_EQ(read->GetItem(2)->FormatText(), second->FormatText());
-}
-
-TEST(MTDensityListKiv, Dialogs) {
-    auto doc = NewSetup(1);
-    CMTDensityListKiv* list = Density(*doc);
-    EXPECT_EQ(list->GetTitle(), "Density of Bed Layer");
-    EXPECT_STREQ(list->GetDlgRuntimeClass(2555), "CMTDensityListDlg");
-    EXPECT_STREQ(list->GetItem(1)->GetDlgRuntimeClass(2555), "CMTDensityItemDlg");
-    EXPECT_EQ(list->GetItem(1)->GetDlgRuntimeClass(7), nullptr);
-    EXPECT_TRUE(list->IsDlgUsedInSetup());
 }

@@ -89,12 +89,3 @@ TEST(MTTransitionListKiv, ExcludedTransitionsAreStillWrittenAndRead) {
     EXPECT_TRUE(Transition(*third)->IncludeTransition());
     EXPECT_TRUE(Transition(*third)->GetItem(2)->IsDlgUsedInSetup());
 }
-
-TEST(MTTransitionListKiv, Dialogs) {
-    auto doc = NewSetup(2);
-    CMTTransitionListKiv* list = Transition(*doc);
-    EXPECT_EQ(list->GetTitle(), "Transition Between Layers");
-    EXPECT_STREQ(list->GetDlgRuntimeClass(2555), "CMTTransitionListDlg");
-    EXPECT_STREQ(list->GetItem(1)->GetDlgRuntimeClass(2555), "CMTTransitionItemDlg");
-    EXPECT_EQ(list->GetDlgRuntimeClass(0), nullptr);
-}
