@@ -5,6 +5,7 @@
 #include "MTWaterColumnKiv.h"
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
+#include "bed/MTMorphologyKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
 #include "watercolumn/MTDispersionKiv.h"
@@ -23,6 +24,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
     AddChild(new CMTDispersionKiv(this));
+    AddChild(new CMTMorphologyKiv(this));
 }
 
 CMudTransportModuleKiv::~CMudTransportModuleKiv() { GetRoot()->UnregisterImportantNode(kKey); }

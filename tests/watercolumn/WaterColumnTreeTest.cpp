@@ -18,7 +18,8 @@ TEST(WaterColumnTree, SectionsSitInFileOrder) {
         return std::find(entries.begin(), entries.end(), name) - entries.begin();
     };
     EXPECT_LT(at("[FORCINGS]"), at("[DISPERSION]"));
-    EXPECT_LT(at("[DISPERSION]"), static_cast<long>(entries.size()));
+    EXPECT_LT(at("[DISPERSION]"), at("[MORPHOLOGY]"));
+    EXPECT_LT(at("[MORPHOLOGY]"), static_cast<long>(entries.size()));
 }
 
 TEST(WaterColumnTree, EveryNodeNamesItsDialogAndTitlesAreThoseShown) {
