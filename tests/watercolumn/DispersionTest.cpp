@@ -55,7 +55,7 @@ TEST(Dispersion, NewSetupWritesBothListsWithScaledEddyViscosity) {
     }
     CMTDispersionKiv* dispersion = Dispersion(*doc);
     EXPECT_EQ(dispersion->GetTitle(), "Dispersion");
-    EXPECT_EQ(dispersion->HelpID(), 5022u);
+    EXPECT_EQ(dispersion->GetHelpID(), 5022u);
     EXPECT_STREQ(dispersion->Horizontal()->GetDlgRuntimeClass(2555), "CMTDispersionListDlg");
     EXPECT_STREQ(dispersion->Vertical()->GetItem(1)->GetDlgRuntimeClass(2555),
                  "CMTDispersionItemDlg");
