@@ -147,15 +147,3 @@ TEST(Settling, ValidationUsesOnlyTheValueOfTheChosenFormulation) {
     EXPECT_FALSE(settling->GetItem(2)->ConstantSettlingVelocity()->IsDisabled());
     EXPECT_TRUE(settling->GetItem(2)->SettlingVelocityCoefficient()->IsDisabled());
 }
-
-TEST(Settling, ResizingKeepsTheRemainingItems) {
-    auto doc = NewSetup(3);
-    CMTSettlingKiv* settling = Settling(*doc);
-    settling->GetItem(2)->Wsn(4.0);
-    settling->GetItem(2)->SettlingVelocityCoefficient()->Constant(0.25);
-    ModelDefinition(doc->Module())->NumberOfFractions(2);
-    ModelDefinition(doc->Module())->NumberOfFractions(3);
-    EXPECT_EQ(settling->GetItem(2)->Wsn(), 4.0);
-    EXPECT_EQ(settling->GetItem(2)->SettlingVelocityCoefficient()->Constant(), 0.25);
-    EXPECT_EQ(settling->GetItem(3)->Wsn(), 1.0);
-}

@@ -58,12 +58,4 @@ inline std::vector<std::string> WarningTexts(const CSetupDocument::OpenResult& r
     return out;
 }
 
-// Every node below from, depth first, for walks over the whole tree.
-inline void Collect(CZoSEKivBase* from, std::vector<CZoSEKivBase*>& out) {
-    out.push_back(from);
-    POSITION pos = 0;
-    for (CZoSEKivBase* c = from->GetFirstChild(pos); c; c = from->GetNextChild(pos))
-        Collect(c, out);
-}
-
 }  // namespace wctest
