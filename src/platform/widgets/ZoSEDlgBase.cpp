@@ -1,5 +1,10 @@
 #include "ZoSEDlgBase.h"
 
+#include "ZoNumberEdit.h"
+
+#include <QKeySequence>
+#include <QShortcut>
+
 #include <map>
 #include <string>
 
@@ -26,7 +31,11 @@ bool IsDialogClassRegistered(const char* className) {
     return className && Factories().count(className) > 0;
 }
 
-CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {}
+CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {
+    auto* help = new QShortcut(QKeySequence::HelpContents, this);
+    help->setContext(Qt::WidgetWithChildrenShortcut);
+    connect(help, &QShortcut::activated, this, [this] { ShowHelp(); });
+}
 
 CZoSEDlgBase::~CZoSEDlgBase() = default;
 
@@ -37,7 +46,22 @@ void CZoSEDlgBase::Attach(CZoSEKivBase* node, CDialogHost* host) {
 
 void CZoSEDlgBase::Initialize() { SetData(); }
 
-void CZoSEDlgBase::SetData() {}
+void CZoSEDlgBase::SetData() { RefreshFields(); }
+
+void CZoSEDlgBase::RefreshFields() {
+    for (CZoNumberEdit* field : findChildren<CZoNumberEdit*>())
+        if (field->IsBound())
+            field->Refresh();
+}
+
+void CZoSEDlgBase::SelectTreeItem(CZoSEKivBase* node) {
+    if (m_host && node)
+        m_host->SelectTreeItem(node);
+}
+
+CString CZoSEDlgBase::AbsoluteFilePath(const CString& path) const {
+    return m_host ? m_host->AbsoluteFilePath(path) : path;
+}
 
 void CZoSEDlgBase::UpdateDoc(int hint) {
     if (m_node)
