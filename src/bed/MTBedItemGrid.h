@@ -4,8 +4,7 @@
 
 #include "widgets/ZoSEGridWndBase.h"
 
-template <class T>
-class CMTBedItemGrid : public CFemGridWnd<T> {
+template <class T> class CMTBedItemGrid : public CFemGridWnd<T> {
 public:
     using CFemGridWnd<T>::CFemGridWnd;
 

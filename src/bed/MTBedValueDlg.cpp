@@ -6,8 +6,7 @@
 #include <QGroupBox>
 #include <QVBoxLayout>
 
-CMTBedValueDlg::CMTBedValueDlg(unsigned long helpId, QWidget* parent)
-    : CZoSEDlgBase(parent) {
+CMTBedValueDlg::CMTBedValueDlg(unsigned long helpId, QWidget* parent) : CZoSEDlgBase(parent) {
     HelpID(helpId);
     auto* frame = new QGroupBox(this);
     m_forms = new CSubFormCollection(frame);

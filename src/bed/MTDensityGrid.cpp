@@ -6,4 +6,6 @@ void CMTDensityGrid::Initialize(CZoSEDlgBase* dialog, CMTDensityListKiv* list) {
     CMTBedItemGrid::Initialize(dialog, list, {"Layer", "Format", "Edit"});
 }
 
-CString CMTDensityGrid::Description(CMTDensityItemKiv* item) const { return item->FormatText(); }
+CString CMTDensityGrid::Description(CMTDensityItemKiv* item) const {
+    return item->FormatText();
+}

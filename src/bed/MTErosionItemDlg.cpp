@@ -28,7 +28,7 @@ CSubFormCollection* AddValueFrame(QWidget* parent, QVBoxLayout* layout, const ch
     layout->addWidget(frame);
     return forms;
 }
-}  // namespace
+} // namespace
 
 CMTErosionItemDlg::CMTErosionItemDlg(QWidget* parent)
     : CZoSEDlgBase(parent), m_soft(new QRadioButton("Soft mud", this)),
@@ -65,7 +65,9 @@ CMTErosionItemDlg::CMTErosionItemDlg(QWidget* parent)
     connect(m_hard, &QRadioButton::clicked, this, [this] { OnMudType(false); });
 }
 
-CMTErosionItemKiv* CMTErosionItemDlg::Item() const { return Section<CMTErosionItemKiv>(); }
+CMTErosionItemKiv* CMTErosionItemDlg::Item() const {
+    return Section<CMTErosionItemKiv>();
+}
 
 void CMTErosionItemDlg::Initialize() {
     if (CMTErosionItemKiv* item = Item()) {

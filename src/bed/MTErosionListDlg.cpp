@@ -16,9 +16,8 @@ constexpr long kConcentrationGroup = 100403;
 }
 
 CMTErosionListDlg::CMTErosionListDlg(QWidget* parent)
-    : CZoSEDlgBase(parent),
-      m_maxConcentration(
-          new CZoNumberEdit(CZoEditStyle().SetOvuUnitBaseGroup(kConcentrationGroup), this)),
+    : CZoSEDlgBase(parent), m_maxConcentration(new CZoNumberEdit(
+                                CZoEditStyle().SetOvuUnitBaseGroup(kConcentrationGroup), this)),
       m_unit(new QLabel(this)), m_grid(new CMTErosionGrid(this)) {
     HelpID(5027);
     m_maxConcentration->setObjectName("maxConcentration");
@@ -40,7 +39,9 @@ CMTErosionListDlg::CMTErosionListDlg(QWidget* parent)
     layout->addStretch(1);
 }
 
-CMTErosionListKiv* CMTErosionListDlg::List() const { return Section<CMTErosionListKiv>(); }
+CMTErosionListKiv* CMTErosionListDlg::List() const {
+    return Section<CMTErosionListKiv>();
+}
 
 void CMTErosionListDlg::Initialize() {
     if (CMTErosionListKiv* list = List()) {

@@ -39,7 +39,9 @@ CMTMorphologyDlg::CMTMorphologyDlg(QWidget* parent)
     connect(m_speedup, &QCheckBox::clicked, this, &CMTMorphologyDlg::Store);
 }
 
-CMTMorphologyKiv* CMTMorphologyDlg::Morphology() const { return Section<CMTMorphologyKiv>(); }
+CMTMorphologyKiv* CMTMorphologyDlg::Morphology() const {
+    return Section<CMTMorphologyKiv>();
+}
 
 void CMTMorphologyDlg::Initialize() {
     if (Morphology())

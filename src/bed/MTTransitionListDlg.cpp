@@ -28,7 +28,9 @@ CMTTransitionListDlg::CMTTransitionListDlg(QWidget* parent)
     connect(m_include, &QCheckBox::clicked, this, &CMTTransitionListDlg::OnInclude);
 }
 
-CMTTransitionListKiv* CMTTransitionListDlg::List() const { return Section<CMTTransitionListKiv>(); }
+CMTTransitionListKiv* CMTTransitionListDlg::List() const {
+    return Section<CMTTransitionListKiv>();
+}
 
 void CMTTransitionListDlg::Initialize() {
     if (CMTTransitionListKiv* list = List())
