@@ -46,7 +46,21 @@ std::uint64_t Mix(std::uint64_t a, std::uint64_t b) {
     return h ^ (h >> 32);
 }
 
-}  // namespace
+// Names are short: two overlapping loads beat a call to memcmp.
+bool SameName(std::string_view a, std::string_view b) {
+    const std::size_t n = a.size();
+    if (n != b.size())
+        return false;
+    if (n >= 8 && n <= 16)
+        return Load8(a.data()) == Load8(b.data()) &&
+               Load8(a.data() + n - 8) == Load8(b.data() + n - 8);
+    if (n >= 4 && n < 8)
+        return Load4(a.data()) == Load4(b.data()) &&
+               Load4(a.data() + n - 4) == Load4(b.data() + n - 4);
+    return a == b;
+}
+
+} // namespace
 
 std::uint64_t HashName(const char* s, std::size_t n) {
     std::uint64_t a = 0;
@@ -86,7 +100,7 @@ std::uint32_t NameTable::Intern(std::string_view name, std::uint64_t hash, Arena
                 Rehash();
             return id;
         }
-        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+        if (hashes_[slot - 1] == hash && SameName(names_[slot - 1], name))
             return slot - 1;
     }
 }
@@ -98,7 +112,7 @@ std::int64_t NameTable::Find(std::string_view name) const {
         const std::uint32_t slot = slots_[i];
         if (slot == 0)
             return -1;
-        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+        if (hashes_[slot - 1] == hash && SameName(names_[slot - 1], name))
             return slot - 1;
     }
 }
@@ -143,8 +157,7 @@ char* FinishReal(char* begin, char* end) {
     return end + 2;
 }
 
-template <class T>
-char* FormatReal(char* buf, T v) {
+template <class T> char* FormatReal(char* buf, T v) {
     if (std::isnan(v)) {
         std::memcpy(buf, "nan", 3);
         return buf + 3;
@@ -160,15 +173,19 @@ char* FormatReal(char* buf, T v) {
     return FinishReal(buf, std::to_chars(buf, buf + 30, v).ptr);
 }
 
-}  // namespace
+} // namespace
 
-char* FormatDouble(char* buf, double v) { return FormatReal(buf, v); }
-char* FormatFloat(char* buf, float v) { return FormatReal(buf, v); }
+char* FormatDouble(char* buf, double v) {
+    return FormatReal(buf, v);
+}
+char* FormatFloat(char* buf, float v) {
+    return FormatReal(buf, v);
+}
 
 bool MayMisroundAsFloat(double d) {
     const double a = std::fabs(d);
     if (!(a < 0x1p128))
-        return false;  // past the overflow boundary whatever the decimal digits were
+        return false; // past the overflow boundary whatever the decimal digits were
     if (a >= 0x1p-126) {
         // A double exactly halfway between two floats may hide which side the text was on.
         std::uint64_t b;
@@ -180,7 +197,9 @@ bool MayMisroundAsFloat(double d) {
 
 // --- Param -------------------------------------------------------------------------------
 
-ParamType Param::Type() const { return type_; }
+ParamType Param::Type() const {
+    return type_;
+}
 
 bool Param::AsInt(std::int32_t& out) const {
     if (type_ != ParamType::Integer)
@@ -282,24 +301,38 @@ namespace {
 const Param kNoParam;
 const Keyword kNoKeyword;
 const Section kNoSection;
-}  // namespace
+} // namespace
 
-std::string_view Keyword::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
-int Keyword::ParamCount() const { return static_cast<int>(count_); }
+std::string_view Keyword::Name() const {
+    return doc_ ? doc_->impl().names[name_] : "";
+}
+int Keyword::ParamCount() const {
+    return static_cast<int>(count_);
+}
 const Param& Keyword::ParamAt(int index) const {
     if (index < 0 || static_cast<std::uint32_t>(index) >= count_)
         return kNoParam;
     return doc_->impl().params[first_ + index];
 }
-Position Keyword::Pos() const { return pos_; }
+Position Keyword::Pos() const {
+    return pos_;
+}
 const Section& Keyword::Owner() const {
     return doc_ ? doc_->impl().sections[owner_] : kNoSection;
 }
 
-std::string_view Section::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
-Position Section::Pos() const { return pos_; }
-const Document& Section::Doc() const { return *doc_; }
-int Section::EntryCount() const { return static_cast<int>(entryCount_); }
+std::string_view Section::Name() const {
+    return doc_ ? doc_->impl().names[name_] : "";
+}
+Position Section::Pos() const {
+    return pos_;
+}
+const Document& Section::Doc() const {
+    return *doc_;
+}
+int Section::EntryCount() const {
+    return static_cast<int>(entryCount_);
+}
 
 bool Section::EntryIsSection(int index) const {
     if (index < 0 || static_cast<std::uint32_t>(index) >= entryCount_)
@@ -371,10 +404,18 @@ Document::Document() : impl_(std::make_unique<Impl>()) {
 
 Document::~Document() = default;
 
-const std::string& Document::FileName() const { return impl_->fileName; }
-void Document::SetFileName(std::string name) { impl_->fileName = std::move(name); }
-const Section& Document::Root() const { return impl_->sections[0]; }
-const std::vector<Diagnostic>& Document::Warnings() const { return impl_->warnings; }
+const std::string& Document::FileName() const {
+    return impl_->fileName;
+}
+void Document::SetFileName(std::string name) {
+    impl_->fileName = std::move(name);
+}
+const Section& Document::Root() const {
+    return impl_->sections[0];
+}
+const std::vector<Diagnostic>& Document::Warnings() const {
+    return impl_->warnings;
+}
 
 void Document::AddWarning(Position pos, std::string message) const {
     impl_->warnings.push_back(Diagnostic{impl_->fileName, pos, std::move(message)});
@@ -385,12 +426,12 @@ void Document::AddWarning(Position pos, std::string message) const {
 struct Builder::State {
     struct Open {
         std::uint32_t section;
-        std::uint32_t capacity;  // entry slots the section owns from its first entry
+        std::uint32_t capacity; // entry slots the section owns from its first entry
     };
     std::vector<Open> open;
-    std::int64_t keyword = -1;  // receives the parameters added next
-    int skipped = 0;            // sections opened past the depth limit, dropped whole
-    std::string name;           // scratch for names that need repair
+    std::int64_t keyword = -1; // receives the parameters added next
+    int skipped = 0;           // sections opened past the depth limit, dropped whole
+    std::string name;          // scratch for names that need repair
 };
 
 Builder::Builder(Document& doc) : doc_(doc), state_(std::make_unique<State>()) {
@@ -405,7 +446,9 @@ namespace {
 bool IsNameStart(char c) {
     return (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_';
 }
-bool IsNameChar(char c) { return IsNameStart(c) || (c >= '0' && c <= '9'); }
+bool IsNameChar(char c) {
+    return IsNameStart(c) || (c >= '0' && c <= '9');
+}
 
 // The writer must produce text that reads back, so a name that could not be read is
 // repaired rather than refused (refusing would unbalance the sections).
@@ -447,7 +490,7 @@ void AppendEntry(Document::Impl& d, Builder::State& st, std::uint32_t entry) {
     ++count;
 }
 
-}  // namespace
+} // namespace
 
 void Builder::BeginSection(std::string_view name) {
     State& st = *state_;
@@ -478,7 +521,7 @@ void Builder::AddKeyword(std::string_view name) {
     State& st = *state_;
     st.keyword = -1;
     if (st.skipped > 0 || st.open.size() == 1)
-        return;  // the top level holds only sections
+        return; // the top level holds only sections
     Document::Impl& d = doc_.impl();
     const std::uint32_t id = d.names.Intern(ValidName(name, st.name), d.text);
     const auto index = static_cast<std::uint32_t>(d.keywords.size());
@@ -495,14 +538,20 @@ void AddParam(Document::Impl& d, std::int64_t keyword, const Param& p) {
     d.params.push_back(p);
     ++Access::ParamCount(d.keywords[keyword]);
 }
-}  // namespace
+} // namespace
 
-void Builder::AddInt(std::int32_t v) { AddParam(doc_.impl(), state_->keyword, Access::Int(v)); }
+void Builder::AddInt(std::int32_t v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Int(v));
+}
 void Builder::AddDouble(double v) {
     AddParam(doc_.impl(), state_->keyword, Access::Double(v));
 }
-void Builder::AddFloat(float v) { AddParam(doc_.impl(), state_->keyword, Access::Float(v)); }
-void Builder::AddBool(bool v) { AddParam(doc_.impl(), state_->keyword, Access::Bool(v)); }
+void Builder::AddFloat(float v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Float(v));
+}
+void Builder::AddBool(bool v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Bool(v));
+}
 
 void Builder::AddString(std::string_view v) {
     if (state_->keyword < 0)
@@ -563,6 +612,8 @@ void Builder::CopySection(const Section& section) {
     }
 }
 
-int Builder::Depth() const { return static_cast<int>(state_->open.size()) - 1 + state_->skipped; }
+int Builder::Depth() const {
+    return static_cast<int>(state_->open.size()) - 1 + state_->skipped;
+}
 
-}  // namespace paramfile
+} // namespace paramfile

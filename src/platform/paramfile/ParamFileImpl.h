@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -69,19 +70,19 @@ private:
     void Rehash();
     std::vector<std::string_view> names_;
     std::vector<std::uint64_t> hashes_;
-    std::vector<std::uint32_t> slots_;  // id + 1, 0 when free
+    std::vector<std::uint32_t> slots_; // id + 1, 0 when free
 };
 
 struct Document::Impl {
     Document* self = nullptr;
     std::string fileName;
-    std::vector<Section> sections;  // [0] is the root
+    std::vector<Section> sections; // [0] is the root
     std::vector<Keyword> keywords;
     std::vector<Param> params;
     std::vector<std::uint32_t> entries;
     NameTable names;
     Arena text;
-    std::size_t sourceBytes = 0;  // size of the text read, a hint for the writer
+    std::size_t sourceBytes = 0; // size of the text read, a hint for the writer
     mutable std::vector<Diagnostic> warnings;
 
     std::size_t MemoryBytes() const;
@@ -172,6 +173,19 @@ struct Access {
     static std::uint32_t EntryCount(const Section& s) { return s.entryCount_; }
 };
 
+// Joins message parts by appending (g++ 12 warns falsely on "literal" + std::string).
+inline void AppendPart(std::string& s, std::string_view v) {
+    s.append(v);
+}
+inline void AppendPart(std::string& s, char c) {
+    s += c;
+}
+template <class... Parts> std::string Cat(const Parts&... parts) {
+    std::string s;
+    (AppendPart(s, parts), ...);
+    return s;
+}
+
 // Shortest text that reads back to the same value, always with '.' or an exponent.
 // buf needs 32 bytes; returns the end.
 char* FormatDouble(char* buf, double v);
@@ -180,4 +194,4 @@ char* FormatFloat(char* buf, float v);
 // True when a double could round to a different float than the decimal text it came from.
 bool MayMisroundAsFloat(double d);
 
-}  // namespace paramfile
+} // namespace paramfile

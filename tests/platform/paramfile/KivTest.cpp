@@ -16,7 +16,9 @@ std::unique_ptr<Document> Parse(const std::string& text) {
     return std::move(r.document);
 }
 
-void* Handle(const Section& s) { return const_cast<Section*>(&s); }
+void* Handle(const Section& s) {
+    return const_cast<Section*>(&s);
+}
 
 void* Sec(const Document& doc, const char* name) {
     return kivSectionByNameNum(Handle(doc.Root()), name, 1);
@@ -31,7 +33,7 @@ TEST(Kiv, WrittenValuesReadBack) {
     kivPutParam(h, "density", 2650.5);
     kivPutParam(h, "ratio", 0.1f);
     kivPutParam(h, "enabled", true);
-    kivPutParam(h, "title", "estuary");  // a literal must not become a boolean
+    kivPutParam(h, "title", "estuary"); // a literal must not become a boolean
     kivPutParam(h, "note", std::string("a \"quoted\" note"));
     kivPutParamFilename(h, "bed", "C:\\data\\bed.dfsu");
     kivAddKeyword(h, "list");
@@ -80,8 +82,8 @@ TEST(Kiv, WrittenValuesReadBack) {
     EXPECT_EQ(kivGetInt(kivParamByNum(list, 1)), -4);
     EXPECT_EQ(kivGetDouble(kivParamByNum(list, 2)), 1e-9);
     EXPECT_EQ(kivGetDouble(kivParamByNum(list, 1)), -4.0);
-    EXPECT_EQ(kivGetInt(kivParamByNum(list, 2)), 0);     // not an integer
-    EXPECT_EQ(kivGetDouble(kivParamByNum(list, 4)), 0);  // not a number
+    EXPECT_EQ(kivGetInt(kivParamByNum(list, 2)), 0);    // not an integer
+    EXPECT_EQ(kivGetDouble(kivParamByNum(list, 4)), 0); // not a number
     EXPECT_EQ(kivGetResultFilename(kivParamByNum(list, 6)), "out.dfs0");
     EXPECT_EQ(kivParamByNum(list, 7), nullptr);
     EXPECT_EQ(kivParamByNum(list, 0), nullptr);
@@ -102,7 +104,8 @@ TEST(Kiv, WrittenValuesReadBack) {
 }
 
 TEST(Kiv, OccurrenceAndIndexSelectTheValue) {
-    auto doc = Parse("S {\n  k = 1, 2\n  Sub {\n    k = 9\n  }\n  k = 3, 4\n  Sub {\n    k = 8\n  }\n}\n");
+    auto doc =
+        Parse("S {\n  k = 1, 2\n  Sub {\n    k = 9\n  }\n  k = 3, 4\n  Sub {\n    k = 8\n  }\n}\n");
     void* s = Sec(*doc, "S");
     int v = 0;
     kivGetParam(s, "k", &v, 2, 2);
@@ -211,4 +214,4 @@ TEST(Kiv, NullHandlesAreIgnored) {
     EXPECT_EQ(kivGetResultFilename(nullptr), "");
 }
 
-}  // namespace
+} // namespace
