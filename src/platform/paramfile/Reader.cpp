@@ -466,7 +466,7 @@ bool Reader::ReadNumber() {
     }
     std::uint64_t m = 0; // up to 19 significant digits
     int sig = 0;
-    int exp10 = 0;
+    std::int64_t exp10 = 0;
     int digits = 0;
     bool truncated = false;
     bool real = false;
