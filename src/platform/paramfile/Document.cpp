@@ -4,6 +4,9 @@
 #include <charconv>
 #include <cmath>
 #include <limits>
+#include <new>
+
+#include <sys/mman.h>
 
 namespace paramfile {
 
@@ -23,6 +26,42 @@ char* Arena::Grow(std::size_t n) {
     left_ = next_ - n;
     next_ = std::min(next_ * 2, kMaxBlock);
     return blocks_.back().get();
+}
+
+namespace {
+constexpr std::size_t kHugePage = std::size_t(2) << 20;
+constexpr std::size_t kMapAbove = 2 * kHugePage;
+std::size_t RoundToHugePage(std::size_t n) { return (n + kHugePage - 1) & ~(kHugePage - 1); }
+} // namespace
+
+void* AllocateTable(std::size_t bytes) {
+    if (bytes < kMapAbove)
+        return ::operator new(bytes);
+    const std::size_t size = RoundToHugePage(bytes);
+    // Over-map by one huge page so the table can start on a huge-page boundary.
+    void* m = ::mmap(nullptr, size + kHugePage, PROT_READ | PROT_WRITE,
+                     MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    if (m == MAP_FAILED)
+        throw std::bad_alloc();
+    const auto raw = reinterpret_cast<std::uintptr_t>(m);
+    const std::uintptr_t start = (raw + kHugePage - 1) & ~(std::uintptr_t(kHugePage) - 1);
+    if (start > raw)
+        ::munmap(m, start - raw);
+    if (const std::size_t tail = raw + size + kHugePage - (start + size); tail > 0)
+        ::munmap(reinterpret_cast<void*>(start + size), tail);
+    ::madvise(reinterpret_cast<void*>(start), size, MADV_HUGEPAGE);
+    return reinterpret_cast<void*>(start);
+}
+
+void FreeTable(void* p, std::size_t bytes) {
+    if (bytes < kMapAbove)
+        ::operator delete(p);
+    else
+        ::munmap(p, RoundToHugePage(bytes));
+}
+
+std::size_t TableBytes(std::size_t bytes) {
+    return bytes < kMapAbove ? bytes : RoundToHugePage(bytes);
 }
 
 namespace {
@@ -136,8 +175,10 @@ std::size_t NameTable::Bytes() const {
 
 std::size_t Document::Impl::MemoryBytes() const {
     std::size_t n = sizeof(Document) + sizeof(Impl) + fileName.capacity();
-    n += sections.capacity() * sizeof(Section) + keywords.capacity() * sizeof(Keyword);
-    n += params.capacity() * sizeof(Param) + entries.capacity() * sizeof(std::uint32_t);
+    n += TableBytes(sections.capacity() * sizeof(Section));
+    n += TableBytes(keywords.capacity() * sizeof(Keyword));
+    n += TableBytes(params.capacity() * sizeof(Param));
+    n += TableBytes(entries.capacity() * sizeof(std::uint32_t));
     n += names.Bytes() + text.Bytes();
     for (const Diagnostic& w : warnings)
         n += sizeof w + w.file.capacity() + w.message.capacity();

@@ -122,7 +122,7 @@ const char* NameEnd(const char* p, const char* end) {
     return p;
 }
 
-template <class T> void Trim(std::vector<T>& v) {
+template <class Vector> void Trim(Vector& v) {
     if (v.capacity() > v.size() + v.size() / 8 + 256)
         v.shrink_to_fit();
 }

@@ -429,6 +429,32 @@ TEST(ParamFileBuilder, DropsSectionsBeyondTheDepthLimit) {
     EXPECT_NE(r.document->Root().FindSection("After"), nullptr);
 }
 
+TEST(ParamFileBuilder, LargeTablesGrowAndReadBack) {
+    // Big enough for every table to leave the small-allocation path.
+    Document doc;
+    Builder b(doc);
+    for (int i = 0; i < 150000; ++i) {
+        if (i % 1000 == 0) {
+            b.EndSection();
+            b.BeginSection("Big");
+        }
+        b.AddKeyword("k");
+        b.AddInt(i);
+        b.AddDouble(i * 0.5);
+        b.AddString("s");
+    }
+    b.EndSection();
+    const std::string text = WriteText(doc);
+    auto back = Parse(text);
+    ASSERT_TRUE(back);
+    EXPECT_EQ(WriteText(*back), text);
+    const Section* last = back->Root().FindSection("Big", 150);
+    ASSERT_NE(last, nullptr);
+    double d = 0;
+    EXPECT_TRUE(last->FindKeyword("k", 1000)->ParamAt(1).AsDouble(d));
+    EXPECT_EQ(d, 149999 * 0.5);
+}
+
 // --- files -------------------------------------------------------------------------------
 
 class ParamFileFiles : public ::testing::Test {
