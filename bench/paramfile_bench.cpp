@@ -81,8 +81,10 @@ private:
                 s += " \"quoted\"\tpart";
             b_.AddString(s);
         } else if (kind < 93) {
-            b_.AddFileName(Join(Pick(0, 1) ? "C:\\Projects\\estuary\\run_" : "../results/run_",
-                                std::to_string(Pick(1, 99)), "/", names_[Pick(0, 299)], ".dfsu"));
+            // Picked one by one: argument order would differ between compilers.
+            const char* dir = Pick(0, 1) ? "C:\\Projects\\estuary\\run_" : "../results/run_";
+            const std::string run = std::to_string(Pick(1, 99));
+            b_.AddFileName(Join(dir, run, "/", names_[Pick(0, 299)], ".dfsu"));
         } else {
             b_.AddBool(Pick(0, 1));
         }
