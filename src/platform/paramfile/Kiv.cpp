@@ -49,10 +49,6 @@ void Warn(const Found& f, const std::string& message) {
     f.keyword->Owner().Doc().AddWarning(f.keyword->Pos(), message);
 }
 
-void Warn(const Found& f, const std::string& message);
-
-std::string OutOfRange(const Found& f, const char* what);
-
 void WarnType(const Found& f, const char* expected) {
     Warn(f, paramfile::Cat(Subject(f), " expects ", expected, ", found ", f.param->TypeName()));
 }
@@ -75,7 +71,8 @@ std::string ValueText(const Param& p) {
     return std::string(buf, e);
 }
 
-std::string OutOfRange(const Found& f, const char* what) {
+// For values of the right kind that the target cannot hold: the value says more than its type.
+std::string AboutValue(const Found& f, const char* what) {
     return paramfile::Cat("'", f.keyword->Name(), "' value ", ValueText(*f.param), what);
 }
 
@@ -84,7 +81,7 @@ void Read(const Found& f, int* value) {
     if (f.param->AsInt(v))
         *value = v;
     else if (f.param->Type() == ParamType::Integer)
-        Warn(f, OutOfRange(f, " is out of range for an integer"));
+        Warn(f, AboutValue(f, " is out of range for an integer"));
     else
         WarnType(f, "an integer");
 }
@@ -93,7 +90,7 @@ void Read(const Found& f, double* value) {
     if (f.param->AsDouble(*value))
         return;
     if (f.param->Type() == ParamType::Integer)
-        Warn(f, OutOfRange(f, " cannot be held exactly by a real number"));
+        Warn(f, AboutValue(f, " cannot be held exactly by a real number"));
     else
         WarnType(f, "a number");
 }
@@ -102,9 +99,9 @@ void Read(const Found& f, float* value) {
     if (f.param->AsFloat(*value))
         return;
     if (f.param->Type() == ParamType::Integer)
-        Warn(f, OutOfRange(f, " cannot be held exactly by a float"));
+        Warn(f, AboutValue(f, " cannot be held exactly by a float"));
     else if (f.param->Type() == ParamType::Double)
-        Warn(f, OutOfRange(f, " is out of range for a float"));
+        Warn(f, AboutValue(f, " is out of range for a float"));
     else
         WarnType(f, "a number");
 }
