@@ -31,7 +31,9 @@ char* Arena::Grow(std::size_t n) {
 namespace {
 constexpr std::size_t kHugePage = std::size_t(2) << 20;
 constexpr std::size_t kMapAbove = 2 * kHugePage;
-std::size_t RoundToHugePage(std::size_t n) { return (n + kHugePage - 1) & ~(kHugePage - 1); }
+std::size_t RoundToHugePage(std::size_t n) {
+    return (n + kHugePage - 1) & ~(kHugePage - 1);
+}
 } // namespace
 
 void* AllocateTable(std::size_t bytes) {
@@ -39,8 +41,8 @@ void* AllocateTable(std::size_t bytes) {
         return ::operator new(bytes);
     const std::size_t size = RoundToHugePage(bytes);
     // Over-map by one huge page so the table can start on a huge-page boundary.
-    void* m = ::mmap(nullptr, size + kHugePage, PROT_READ | PROT_WRITE,
-                     MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    void* m = ::mmap(nullptr, size + kHugePage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS,
+                     -1, 0);
     if (m == MAP_FAILED)
         throw std::bad_alloc();
     const auto raw = reinterpret_cast<std::uintptr_t>(m);
@@ -609,7 +611,9 @@ void Builder::AddFileName(std::string_view v) {
 }
 
 void Builder::CopySection(const Section& section) {
-    if (&section.Doc() == &doc_) {
+    if (!Access::DocOf(section))
+        return;
+    if (Access::DocOf(section) == &doc_) {
         // Copying from ourselves would read entries that move as we append.
         Document copy;
         Builder(copy).CopySection(section);

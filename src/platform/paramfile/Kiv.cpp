@@ -373,7 +373,7 @@ void kivGetListParam(void* h, const char* keyword, int occurrence, const char* f
 }
 
 void kivWarn(void* h, const char* keyword, const std::string& message) {
-    if (!h)
+    if (!h || !Access::DocOf(*In(h)))
         return;
     const Section* s = In(h);
     const Keyword* k = keyword ? s->FindKeyword(keyword) : nullptr;

@@ -108,6 +108,8 @@ struct Document::Impl {
 // Private access for the free functions of the library.
 struct Access {
     static const Document::Impl& Of(const Section& s) { return s.doc_->impl(); }
+    // Null for the placeholder handed out for an index out of range.
+    static const Document* DocOf(const Section& s) { return s.doc_; }
     static const Document::Impl& Of(const Keyword& k) { return k.doc_->impl(); }
 
     static Param Int(std::int64_t v) {

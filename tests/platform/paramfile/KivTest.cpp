@@ -196,6 +196,7 @@ TEST(Kiv, WarnPointsAtKeywordOrSection) {
     kivWarn(s, "absent", "check section");
     kivWarn(s, nullptr, "also section");
     kivWarn(nullptr, "k", "dropped");
+    kivWarn(Handle(doc->Root().SectionAt(5)), "k", "dropped");
     ASSERT_EQ(doc->Warnings().size(), 3u);
     EXPECT_EQ(doc->Warnings()[0].ToString(), "mud.par:3:3: check k");
     EXPECT_EQ(doc->Warnings()[1].ToString(), "mud.par:2:1: check section");

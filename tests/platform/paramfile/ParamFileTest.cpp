@@ -406,6 +406,7 @@ TEST(ParamFileBuilder, CopiesSectionsFromAnyDocument) {
     src.reset(); // the copy owns its text
     Builder b(doc);
     b.CopySection(*doc.Root().FindSection("Outer")); // from itself
+    b.CopySection(doc.Root().SectionAt(7));          // out of range: nothing
     const std::string want = "Outer {\n    S {\n        a = 1, \"t\", 'f'\n        T {\n"
                              "            b = 2.5\n        }\n    }\n}\n";
     EXPECT_EQ(WriteText(doc), want + want);
