@@ -163,8 +163,9 @@ bool SameParam(const Param& built, const Param& read) {
     }
     case ParamType::Double: {
         double x = 0, y = 0;
+        float fx = 0, fy = 0;
         return read.Type() == ParamType::Double && built.AsDouble(x) && read.AsDouble(y) &&
-               SameBits(x, y);
+               SameBits(x, y) && built.AsFloat(fx) == read.AsFloat(fy) && SameBits(fx, fy);
     }
     case ParamType::Float: {
         float x = 0, y = 0;

@@ -238,6 +238,14 @@ bool MayMisroundAsFloat(double d) {
     return a != 0 && static_cast<double>(static_cast<float>(d)) != d;
 }
 
+float FloatOfText(const char* begin, const char* end, double d) {
+    float f;
+    if (std::from_chars(begin, end, f).ec == std::errc())
+        return f;
+    const float big = std::fabs(d) > 1 ? std::numeric_limits<float>::infinity() : 0.0f;
+    return std::signbit(d) ? -big : big;
+}
+
 // --- Param -------------------------------------------------------------------------------
 
 ParamType Param::Type() const {
@@ -587,7 +595,13 @@ void Builder::AddInt(std::int32_t v) {
     AddParam(doc_.impl(), state_->keyword, Access::Int(v));
 }
 void Builder::AddDouble(double v) {
-    AddParam(doc_.impl(), state_->keyword, Access::Double(v));
+    Param p = Access::Double(v);
+    if (MayMisroundAsFloat(v)) {
+        // Read as float, the value must agree with what its written text will give.
+        char text[32];
+        Access::SetFloat(p, FloatOfText(text, FormatDouble(text, v), v));
+    }
+    AddParam(doc_.impl(), state_->keyword, p);
 }
 void Builder::AddFloat(float v) {
     AddParam(doc_.impl(), state_->keyword, Access::Float(v));

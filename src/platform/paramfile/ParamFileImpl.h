@@ -212,5 +212,7 @@ char* FormatFloat(char* buf, float v);
 
 // True when a double could round to a different float than the decimal text it came from.
 bool MayMisroundAsFloat(double d);
+// The float nearest to the decimal text [begin, end), whose value as a double is d.
+float FloatOfText(const char* begin, const char* end, double d);
 
 } // namespace paramfile

@@ -554,15 +554,8 @@ bool Reader::ReadNumber() {
             return Fail(start, Cat("invalid number '", Token(start), "'"));
     }
     Param p = Access::Double(d);
-    if (MayMisroundAsFloat(d)) {
-        float f;
-        const auto r = std::from_chars(start, q, f);
-        if (r.ec != std::errc()) {
-            const float big = std::fabs(d) > 1 ? std::numeric_limits<float>::infinity() : 0.0f;
-            f = neg ? -big : big;
-        }
-        Access::SetFloat(p, f);
-    }
+    if (MayMisroundAsFloat(d))
+        Access::SetFloat(p, FloatOfText(start, q, d));
     Push(p);
     return true;
 }

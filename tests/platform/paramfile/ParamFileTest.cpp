@@ -225,6 +225,15 @@ TEST(ParamFileReader, RealReadAsFloatIsTheFloatOfTheText) {
     EXPECT_FALSE(x.ParamAt(3).AsFloat(f)); // beyond float range
     EXPECT_FALSE(x.ParamAt(4).AsFloat(f)); // no float holds it exactly
     EXPECT_EQ(f, 5);
+
+    // Built in memory, the same double reads as the float of the text it will be written as.
+    Document built;
+    Builder b(built);
+    b.BeginSection("A");
+    b.AddKeyword("x");
+    b.AddDouble(1 + 0x1p-24);
+    ASSERT_TRUE(built.Root().SectionAt(0).KeywordAt(0).ParamAt(0).AsFloat(f));
+    EXPECT_EQ(Bits(f), Bits(std::nextafter(1.0f, 2.0f)));
 }
 
 // --- writer ------------------------------------------------------------------------------
@@ -657,6 +666,9 @@ void ExpectSameParam(const Param& built, const Param& read) {
         built.AsDouble(a);
         read.AsDouble(b);
         EXPECT_TRUE(std::isnan(a) ? std::isnan(b) : Bits(a) == Bits(b));
+        float fa = 0, fb = 0;
+        EXPECT_EQ(built.AsFloat(fa), read.AsFloat(fb));
+        EXPECT_TRUE(std::isnan(fa) ? std::isnan(fb) : Bits(fa) == Bits(fb));
         return;
     }
     case ParamType::String:
