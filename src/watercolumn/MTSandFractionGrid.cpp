@@ -2,8 +2,34 @@
 
 #include "fem/UnitUtil.h"
 
+#include <QHeaderView>
+
+#include <algorithm>
+
 namespace {
 constexpr long kSettlingVelocityUnit = 100128;
+
+// The row headings are bare numbers, narrower than the heading "Fraction" above them in the
+// corner: the heading column is made as wide as that heading.
+class CRowHeadings : public QHeaderView {
+public:
+    CRowHeadings(const QString& cornerHeading, QWidget* parent)
+        : QHeaderView(Qt::Vertical, parent), m_corner(cornerHeading) {
+        setSectionsMovable(false);
+        setHighlightSections(true);
+        setSectionsClickable(true);
+    }
+    QSize sizeHint() const override {
+        QSize hint = QHeaderView::sizeHint();
+        const int corner = fontMetrics().horizontalAdvance(m_corner) +
+                           2 * style()->pixelMetric(QStyle::PM_HeaderMargin, nullptr, this) + 4;
+        hint.setWidth(std::max(hint.width(), corner));
+        return hint;
+    }
+
+private:
+    QString m_corner;
+};
 
 CZoEditStyle VelocityStyle() {
     return CZoEditStyle().SetOvuUnitBaseGroup(kSettlingVelocityUnit).SetFormat("%.11g");
@@ -12,6 +38,7 @@ CZoEditStyle VelocityStyle() {
 
 CMTSandFractionGrid::CMTSandFractionGrid(QWidget* parent) : CFemGridWnd(parent) {
     setObjectName("sandFractionGrid");
+    setVerticalHeader(new CRowHeadings("Fraction", this));
 }
 
 void CMTSandFractionGrid::Initialize(CZoSEDlgBase* dialog, CMTSandFractionListKiv* list) {
