@@ -21,6 +21,7 @@
 #include <gtest/gtest.h>
 
 #include <initializer_list>
+#include <ostream>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -108,3 +109,6 @@ private:
 };
 
 }  // namespace uitest
+
+// Readable QStrings in test failures.
+inline void PrintTo(const QString& text, std::ostream* os) { *os << '"' << text.toStdString() << '"'; }

@@ -10,6 +10,7 @@
 #include <QComboBox>
 #include <QHeaderView>
 #include <QKeyEvent>
+#include <QLayout>
 #include <QLineEdit>
 #include <QMouseEvent>
 #include <QPainter>
@@ -511,11 +512,12 @@ CZoGridWnd::~CZoGridWnd() {
 }
 
 void CZoGridWnd::SetDialog(CZoSEDlgBase* dialog) {
-    if (m_dialog)
-        m_dialog->removeEventFilter(this);
+    if (m_dialogWidget)
+        m_dialogWidget->removeEventFilter(this);
     m_dialog = dialog;
-    if (m_dialog)
-        m_dialog->installEventFilter(this);
+    m_dialogWidget = dialog;
+    if (m_dialogWidget)
+        m_dialogWidget->installEventFilter(this);
 }
 
 void CZoGridWnd::SetRowCount(int rows) {
@@ -545,17 +547,23 @@ void CZoGridWnd::FitColumns() {
 }
 
 void CZoGridWnd::SizeToDialog() {
-    QWidget* frame = m_dialog ? static_cast<QWidget*>(m_dialog) : window();
+    QWidget* frame = m_dialogWidget ? m_dialogWidget.data() : window();
     if (!frame || frame == this || !frame->isAncestorOf(this) || m_fitting)
         return;
     m_fitting = true;
-    // Margins of 7 dialog units, from the dialog font's average character.
+    // The dialog's right and bottom margins: its layout's, or else 7 dialog units of its font.
     const QFontMetrics fm(frame->font());
-    const int marginX = 7 * fm.averageCharWidth() / 4;
-    const int marginY = 7 * fm.height() / 8;
+    int marginX = 7 * fm.averageCharWidth() / 4;
+    int marginY = 7 * fm.height() / 8;
+    if (frame->layout()) {
+        marginX = frame->layout()->contentsMargins().right();
+        marginY = frame->layout()->contentsMargins().bottom();
+    }
     const QPoint topLeft = mapTo(frame, QPoint(0, 0));
-    const QSize available(frame->width() - marginX - topLeft.x(),
-                          frame->height() - marginY - topLeft.y());
+    // The frame is outside the cells: what is left for them is the space less the frame.
+    const int frameSize = 2 * frameWidth();
+    const QSize available(frame->width() - marginX - topLeft.x() - frameSize,
+                          frame->height() - marginY - topLeft.y() - frameSize);
     const int headerWidth = verticalHeader()->isHidden() ? 0 : verticalHeader()->sizeHint().width();
     const int headerHeight =
         horizontalHeader()->isHidden() ? 0 : horizontalHeader()->sizeHint().height();
@@ -609,8 +617,8 @@ void CZoGridWnd::StoreCell(int row, int col, const CGridCellValue& value) {
 }
 
 void CZoGridWnd::UpdateDoc(int hint) {
-    if (m_dialog)
-        m_dialog->UpdateDoc(hint);
+    if (CZoSEDlgBase* dialog = Dialog())
+        dialog->UpdateDoc(hint);
 }
 
 bool CZoGridWnd::GetCurrentCell(int& row, int& col) const {
@@ -682,7 +690,7 @@ void CZoGridWnd::mousePressEvent(QMouseEvent* event) {
 }
 
 bool CZoGridWnd::eventFilter(QObject* watched, QEvent* event) {
-    if (watched == m_dialog && event->type() == QEvent::Resize && m_fitted) {
+    if (watched == m_dialogWidget.data() && event->type() == QEvent::Resize && m_fitted) {
         SizeToDialog();
     } else if (event->type() == QEvent::Paint && m_corner && watched == m_corner) {
         auto* corner = static_cast<QAbstractButton*>(watched);

@@ -90,7 +90,7 @@ public:
 
     // The dialog that receives the grid's update hints and whose frame the grid fits into.
     void SetDialog(CZoSEDlgBase* dialog);
-    CZoSEDlgBase* Dialog() const { return m_dialog; }
+    CZoSEDlgBase* Dialog() const { return m_dialogWidget ? m_dialog : nullptr; }
 
     void SetRowCount(int rows);
     void SetColCount(int cols);
@@ -101,8 +101,8 @@ public:
     void Redraw();
     // Column widths to their contents.
     void FitColumns();
-    // Sizes the grid to its contents within the dialog, with scroll bars where it does not
-    // fit; done again whenever the dialog is resized.
+    // Sizes the grid to its contents within the dialog (up to the dialog's layout margins),
+    // with scroll bars where it does not fit; done again whenever the dialog is resized.
     void SizeToDialog();
     const ZoGridFit& LastFit() const { return m_fit; }
 
@@ -144,7 +144,9 @@ protected:
 private:
     CZoGridModel* m_model;
     QPointer<QAbstractButton> m_corner;
-    QPointer<CZoSEDlgBase> m_dialog;
+    // Watched as a plain widget: its events still come while it is being destroyed.
+    CZoSEDlgBase* m_dialog = nullptr;
+    QPointer<QWidget> m_dialogWidget;
     int m_rowCount = 0;
     int m_colCount = 0;
     ZoGridFit m_fit;

@@ -126,6 +126,12 @@ void CZoNumberEdit::Commit(bool finished) {
         ZoShowMessage(this, message);
         return;
     }
+    // A count that more digits could still turn into another valid count waits for them or
+    // for the field to be left: "1" on the way to "12" must not first cut the lists to one
+    // item and lose the items' values.
+    if (!finished && m_kind == ZoNumberKind::Int && m_style.HasMaximum() && value > 0 &&
+        value * 10 <= m_style.Maximum())
+        return;
     QPointer<CZoNumberEdit> self(this);
     QPointer<CZoSEDlgBase> dialog(m_dialog);
     m_busy = true;

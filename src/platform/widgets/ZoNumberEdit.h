@@ -42,7 +42,8 @@ public:
     void BindInt(CZoSEDlgBase* dialog, int& value);
     bool IsBound() const { return static_cast<bool>(m_get); }
 
-    // Counts store on every change of the text instead of when the field is left.
+    // Counts store on every change of the text instead of when the field is left; a count
+    // that further digits could still change ("1" of a field up to 12) waits until then.
     void SetStoreOnChange(bool onChange) { m_storeOnChange = onChange; }
     bool StoresOnChange() const { return m_storeOnChange; }
 

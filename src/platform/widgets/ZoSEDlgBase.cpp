@@ -2,8 +2,8 @@
 
 #include "ZoNumberEdit.h"
 
+#include <QKeyEvent>
 #include <QKeySequence>
-#include <QShortcut>
 
 #include <map>
 #include <string>
@@ -31,10 +31,16 @@ bool IsDialogClassRegistered(const char* className) {
     return className && Factories().count(className) > 0;
 }
 
-CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {
-    auto* help = new QShortcut(QKeySequence::HelpContents, this);
-    help->setContext(Qt::WidgetWithChildrenShortcut);
-    connect(help, &QShortcut::activated, this, [this] { ShowHelp(); });
+CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {}
+
+void CZoSEDlgBase::keyPressEvent(QKeyEvent* event) {
+    // F1 reaches the innermost dialog around the focus (a page inside a sheet), never two.
+    if (event->matches(QKeySequence::HelpContents)) {
+        event->accept();
+        ShowHelp();
+        return;
+    }
+    QWidget::keyPressEvent(event);
 }
 
 CZoSEDlgBase::~CZoSEDlgBase() = default;

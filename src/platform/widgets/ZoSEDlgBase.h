@@ -68,6 +68,8 @@ public:
     void HideCaption(int hide);
 
 protected:
+    void keyPressEvent(QKeyEvent* event) override;
+
     CZoSEKivBase* m_node = nullptr;
     CDialogHost* m_host = nullptr;
 };
