@@ -54,32 +54,36 @@ inline int Int(const paramfile::Section& s, std::string_view kw, int param = 0) 
     int v = -999999;
     const paramfile::Keyword* k = s.FindKeyword(kw);
     EXPECT_NE(k, nullptr) << kw;
-    if (k && param < k->ParamCount())
+    if (k && param < k->ParamCount()) {
         EXPECT_TRUE(k->ParamAt(param).AsInt(v)) << kw;
+    }
     return v;
 }
 inline double Double(const paramfile::Section& s, std::string_view kw, int param = 0) {
     double v = -999999;
     const paramfile::Keyword* k = s.FindKeyword(kw);
     EXPECT_NE(k, nullptr) << kw;
-    if (k && param < k->ParamCount())
+    if (k && param < k->ParamCount()) {
         EXPECT_TRUE(k->ParamAt(param).AsDouble(v)) << kw;
+    }
     return v;
 }
 inline bool Bool(const paramfile::Section& s, std::string_view kw) {
     bool v = false;
     const paramfile::Keyword* k = s.FindKeyword(kw);
     EXPECT_NE(k, nullptr) << kw;
-    if (k && k->ParamCount() > 0)
+    if (k && k->ParamCount() > 0) {
         EXPECT_TRUE(k->ParamAt(0).AsBool(v)) << kw;
+    }
     return v;
 }
 inline std::string String(const paramfile::Section& s, std::string_view kw) {
     std::string v;
     const paramfile::Keyword* k = s.FindKeyword(kw);
     EXPECT_NE(k, nullptr) << kw;
-    if (k && k->ParamCount() > 0)
+    if (k && k->ParamCount() > 0) {
         EXPECT_TRUE(k->ParamAt(0).AsString(v)) << kw;
+    }
     return v;
 }
 

@@ -12,11 +12,15 @@ CZoSEKivBase::CZoSEKivBase(const CString& title, const CString& sectionName,
         m_root = parent->m_root;
 }
 
-CZoSEKivBase::~CZoSEKivBase() {
+CZoSEKivBase::~CZoSEKivBase() { DeleteChildren(); }
+
+void CZoSEKivBase::DeleteChildren() {
     for (auto it = m_children.rbegin(); it != m_children.rend(); ++it)
         delete *it;
+    m_children.clear();
     for (auto it = m_properties.rbegin(); it != m_properties.rend(); ++it)
         delete *it;
+    m_properties.clear();
 }
 
 void CZoSEKivBase::AddChild(CZoSEKivBase* node) {
@@ -187,7 +191,8 @@ void CZoSEKivBase::TouchAllChildren() {
 
 CZoSEKivGlobalBase::CZoSEKivGlobalBase() : CZoSEKivBase("", "", nullptr) { m_root = this; }
 
-CZoSEKivGlobalBase::~CZoSEKivGlobalBase() = default;
+// The nodes unregister themselves when deleted, so they go while the registry still exists.
+CZoSEKivGlobalBase::~CZoSEKivGlobalBase() { DeleteChildren(); }
 
 void CZoSEKivGlobalBase::RegisterImportantNode(CZoSEKivBase* node, const CString& key) {
     for (Entry& e : m_registry)

@@ -89,6 +89,8 @@ public:
 
 protected:
     const std::vector<CZoSEKivBase*>& Children() const { return m_children; }
+    // Deletes children and properties, the last added first.
+    void DeleteChildren();
     CZoSEKivGlobalBase* m_root = nullptr;
 
 private:
