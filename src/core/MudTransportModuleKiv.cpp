@@ -5,6 +5,7 @@
 #include "MTWaterColumnKiv.h"
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
+#include "bed/MTMorphologyKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
 
@@ -21,6 +22,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTWaterColumnKiv(this));
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
+    AddChild(new CMTMorphologyKiv(this));
 }
 
 CMudTransportModuleKiv::~CMudTransportModuleKiv() { GetRoot()->UnregisterImportantNode(kKey); }

@@ -60,9 +60,13 @@ private:
     friend class Keyword;
     friend class Builder;
     friend struct Access;
+    // Integer, double or float bits, 0/1, or a pointer to text held by the document.
     std::uint64_t bits_ = 0;
+    // Text length; for a real read from text that a double would misround as float, the
+    // float itself (flags_ says so).
     std::uint32_t aux_ = 0;
     ParamType type_ = ParamType::Integer;
+    std::uint8_t flags_ = 0;
 };
 
 class Keyword {
@@ -78,7 +82,9 @@ private:
     friend class Section;
     friend class Builder;
     friend struct Access;
-    const Section* owner_ = nullptr;
+    // Indices into the document's tables, so that the tables may grow while building.
+    const Document* doc_ = nullptr;
+    std::uint32_t owner_ = 0;
     std::uint32_t name_ = 0;
     std::uint32_t first_ = 0;
     std::uint32_t count_ = 0;

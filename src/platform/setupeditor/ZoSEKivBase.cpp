@@ -15,12 +15,18 @@ CZoSEKivBase::CZoSEKivBase(const CString& title, const CString& sectionName,
 CZoSEKivBase::~CZoSEKivBase() { DeleteChildren(); }
 
 void CZoSEKivBase::DeleteChildren() {
-    for (auto it = m_children.rbegin(); it != m_children.rend(); ++it)
-        delete *it;
-    m_children.clear();
-    for (auto it = m_properties.rbegin(); it != m_properties.rend(); ++it)
-        delete *it;
-    m_properties.clear();
+    // Later nodes may depend on earlier ones (lists on the model definition, module lists on
+    // host lists), so the last goes first.
+    while (!m_children.empty()) {
+        CZoSEKivBase* c = m_children.back();
+        m_children.pop_back();
+        delete c;
+    }
+    while (!m_properties.empty()) {
+        CZoSEKivBase* p = m_properties.back();
+        m_properties.pop_back();
+        delete p;
+    }
 }
 
 void CZoSEKivBase::AddChild(CZoSEKivBase* node) {
@@ -191,7 +197,7 @@ void CZoSEKivBase::TouchAllChildren() {
 
 CZoSEKivGlobalBase::CZoSEKivGlobalBase() : CZoSEKivBase("", "", nullptr) { m_root = this; }
 
-// The nodes unregister themselves when deleted, so they go while the registry still exists.
+// Children unregister themselves from the registry as they go, so they go first.
 CZoSEKivGlobalBase::~CZoSEKivGlobalBase() { DeleteChildren(); }
 
 void CZoSEKivGlobalBase::RegisterImportantNode(CZoSEKivBase* node, const CString& key) {

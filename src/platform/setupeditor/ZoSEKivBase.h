@@ -89,7 +89,7 @@ public:
 
 protected:
     const std::vector<CZoSEKivBase*>& Children() const { return m_children; }
-    // Deletes children and properties, the last added first.
+    // Deletes children and properties, last first, while this node is still whole.
     void DeleteChildren();
     CZoSEKivGlobalBase* m_root = nullptr;
 

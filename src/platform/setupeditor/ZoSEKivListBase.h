@@ -200,9 +200,11 @@ public:
         // A list without a section of its own shares its parent's, whose count is not its own.
         if (GetSectionNamePattern().empty())
             return;
-        if (!kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1))
+        void* keyword = kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1);
+        if (!keyword)
             return;
-        int n = 0;
+        // No value counts as 0; a value of the wrong type keeps the count (with a warning).
+        int n = kivParamCount(keyword) == 0 ? 0 : GetItemCount();
         kivGetParam(h, "ZoSEKivListItemCount", &n, 1, 1);
         if (n < 0 || n > kMaxListItemCount) {
             kivWarn(h, "ZoSEKivListItemCount",

@@ -1,0 +1,7 @@
+#include "MTDensityListKiv.h"
+
+const char* CMTDensityListKiv::GetDlgRuntimeClass(unsigned code) {
+    return code == kDlgRuntimeClassRequest
+               ? "CMTDensityListDlg"
+               : CMTCountListKiv<CMTDensityItemKiv>::GetDlgRuntimeClass(code);
+}

@@ -1,0 +1,30 @@
+#include "MTTransitionListKiv.h"
+
+#include "setupeditor/KivFields.h"
+
+struct TransitionListFields {
+    using F = KivField<CMTTransitionListKiv>;
+    static inline const F kFields[] = {
+        F::Bool("include_transition", &CMTTransitionListKiv::m_includeTransition, false),
+    };
+};
+
+CMTTransitionListKiv::CMTTransitionListKiv(CZoSEKivBase* parent)
+    : CMTCountListKiv<CMTTransitionItemKiv>("Transition Between Layers", "TRANSITION", parent,
+                                            MTCount::LayerPairs) {
+    DefaultFields(*this, TransitionListFields::kFields);
+}
+
+void CMTTransitionListKiv::WriteData(void* h) {
+    WriteFields(h, *this, TransitionListFields::kFields);
+}
+
+void CMTTransitionListKiv::ReadData(void* h) { ReadFields(h, *this, TransitionListFields::kFields); }
+
+void CMTTransitionListKiv::SetDefault() { DefaultFields(*this, TransitionListFields::kFields); }
+
+const char* CMTTransitionListKiv::GetDlgRuntimeClass(unsigned code) {
+    return code == kDlgRuntimeClassRequest
+               ? "CMTTransitionListDlg"
+               : CMTCountListKiv<CMTTransitionItemKiv>::GetDlgRuntimeClass(code);
+}

@@ -1,0 +1,568 @@
+#include "paramfile/ParamFileImpl.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <limits>
+
+namespace paramfile {
+
+// --- storage -----------------------------------------------------------------------------
+
+char* Arena::Grow(std::size_t n) {
+    constexpr std::size_t kMaxBlock = std::size_t(1) << 20;
+    if (n > next_ / 4) {
+        // A large value gets a block of its own so the current block keeps its room.
+        blocks_.emplace_back(new char[n]);
+        bytes_ += n;
+        return blocks_.back().get();
+    }
+    blocks_.emplace_back(new char[next_]);
+    bytes_ += next_;
+    cur_ = blocks_.back().get() + n;
+    left_ = next_ - n;
+    next_ = std::min(next_ * 2, kMaxBlock);
+    return blocks_.back().get();
+}
+
+namespace {
+
+std::uint64_t Load8(const char* p) {
+    std::uint64_t v;
+    std::memcpy(&v, p, 8);
+    return v;
+}
+
+std::uint32_t Load4(const char* p) {
+    std::uint32_t v;
+    std::memcpy(&v, p, 4);
+    return v;
+}
+
+std::uint64_t Mix(std::uint64_t a, std::uint64_t b) {
+    std::uint64_t h = a * 0x9E3779B97F4A7C15ull ^ b * 0xC2B2AE3D27D4EB4Full;
+    h ^= h >> 29;
+    h *= 0xBF58476D1CE4E5B9ull;
+    return h ^ (h >> 32);
+}
+
+}  // namespace
+
+std::uint64_t HashName(const char* s, std::size_t n) {
+    std::uint64_t a = 0;
+    std::uint64_t b = n;
+    if (n > 16) {
+        for (std::size_t i = 0; i + 8 < n; i += 8)
+            a = Mix(a ^ Load8(s + i), n);
+        b ^= Load8(s + n - 8);
+    } else if (n >= 8) {
+        a = Load8(s);
+        b ^= Load8(s + n - 8) << 1;
+    } else if (n >= 4) {
+        a = Load4(s);
+        b ^= std::uint64_t(Load4(s + n - 4)) << 8;
+    } else if (n > 0) {
+        a = std::uint8_t(s[0]) | std::uint32_t(std::uint8_t(s[n / 2])) << 8 |
+            std::uint32_t(std::uint8_t(s[n - 1])) << 16;
+    }
+    return Mix(a, b);
+}
+
+NameTable::NameTable() : slots_(64, 0) {
+    Arena none;
+    Intern(std::string_view(), none);
+}
+
+std::uint32_t NameTable::Intern(std::string_view name, std::uint64_t hash, Arena& arena) {
+    const std::size_t mask = slots_.size() - 1;
+    for (std::size_t i = hash & mask;; i = (i + 1) & mask) {
+        const std::uint32_t slot = slots_[i];
+        if (slot == 0) {
+            const auto id = static_cast<std::uint32_t>(names_.size());
+            names_.emplace_back(arena.Store(name), name.size());
+            hashes_.push_back(hash);
+            slots_[i] = id + 1;
+            if (names_.size() * 2 > slots_.size())
+                Rehash();
+            return id;
+        }
+        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+            return slot - 1;
+    }
+}
+
+std::int64_t NameTable::Find(std::string_view name) const {
+    const std::uint64_t hash = HashName(name.data(), name.size());
+    const std::size_t mask = slots_.size() - 1;
+    for (std::size_t i = hash & mask;; i = (i + 1) & mask) {
+        const std::uint32_t slot = slots_[i];
+        if (slot == 0)
+            return -1;
+        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+            return slot - 1;
+    }
+}
+
+void NameTable::Rehash() {
+    std::vector<std::uint32_t> slots(slots_.size() * 2, 0);
+    const std::size_t mask = slots.size() - 1;
+    for (std::uint32_t id = 0; id < names_.size(); ++id) {
+        std::size_t i = hashes_[id] & mask;
+        while (slots[i] != 0)
+            i = (i + 1) & mask;
+        slots[i] = id + 1;
+    }
+    slots_.swap(slots);
+}
+
+std::size_t NameTable::Bytes() const {
+    return names_.capacity() * sizeof(std::string_view) +
+           hashes_.capacity() * sizeof(std::uint64_t) + slots_.capacity() * sizeof(std::uint32_t);
+}
+
+std::size_t Document::Impl::MemoryBytes() const {
+    std::size_t n = sizeof(Document) + sizeof(Impl) + fileName.capacity();
+    n += sections.capacity() * sizeof(Section) + keywords.capacity() * sizeof(Keyword);
+    n += params.capacity() * sizeof(Param) + entries.capacity() * sizeof(std::uint32_t);
+    n += names.Bytes() + text.Bytes();
+    for (const Diagnostic& w : warnings)
+        n += sizeof w + w.file.capacity() + w.message.capacity();
+    return n;
+}
+
+// --- numbers -----------------------------------------------------------------------------
+
+namespace {
+
+char* FinishReal(char* begin, char* end) {
+    for (const char* p = begin; p != end; ++p)
+        if (*p == '.' || *p == 'e')
+            return end;
+    end[0] = '.';
+    end[1] = '0';
+    return end + 2;
+}
+
+template <class T>
+char* FormatReal(char* buf, T v) {
+    if (std::isnan(v)) {
+        std::memcpy(buf, "nan", 3);
+        return buf + 3;
+    }
+    if (std::isinf(v)) {
+        if (v < 0) {
+            std::memcpy(buf, "-inf", 4);
+            return buf + 4;
+        }
+        std::memcpy(buf, "inf", 3);
+        return buf + 3;
+    }
+    return FinishReal(buf, std::to_chars(buf, buf + 30, v).ptr);
+}
+
+}  // namespace
+
+char* FormatDouble(char* buf, double v) { return FormatReal(buf, v); }
+char* FormatFloat(char* buf, float v) { return FormatReal(buf, v); }
+
+bool MayMisroundAsFloat(double d) {
+    const double a = std::fabs(d);
+    if (!(a < 0x1p128))
+        return false;  // past the overflow boundary whatever the decimal digits were
+    if (a >= 0x1p-126) {
+        // A double exactly halfway between two floats may hide which side the text was on.
+        std::uint64_t b;
+        std::memcpy(&b, &d, sizeof b);
+        return (b & 0x1FFFFFFFu) == 0x10000000u;
+    }
+    return a != 0 && static_cast<double>(static_cast<float>(d)) != d;
+}
+
+// --- Param -------------------------------------------------------------------------------
+
+ParamType Param::Type() const { return type_; }
+
+bool Param::AsInt(std::int32_t& out) const {
+    if (type_ != ParamType::Integer)
+        return false;
+    const auto v = static_cast<std::int64_t>(bits_);
+    if (v < std::numeric_limits<std::int32_t>::min() ||
+        v > std::numeric_limits<std::int32_t>::max())
+        return false;
+    out = static_cast<std::int32_t>(v);
+    return true;
+}
+
+bool Param::AsDouble(double& out) const {
+    switch (type_) {
+    case ParamType::Integer: {
+        const auto v = static_cast<std::int64_t>(bits_);
+        const auto d = static_cast<double>(v);
+        if (d >= 0x1p63 || static_cast<std::int64_t>(d) != v)
+            return false;
+        out = d;
+        return true;
+    }
+    case ParamType::Double:
+        out = Access::DoubleOf(*this);
+        return true;
+    case ParamType::Float:
+        out = Access::FloatOf(*this);
+        return true;
+    default:
+        return false;
+    }
+}
+
+bool Param::AsFloat(float& out) const {
+    switch (type_) {
+    case ParamType::Integer: {
+        const auto v = static_cast<std::int64_t>(bits_);
+        const auto f = static_cast<float>(v);
+        if (f >= 0x1p63f || static_cast<std::int64_t>(f) != v)
+            return false;
+        out = f;
+        return true;
+    }
+    case ParamType::Double: {
+        const double d = Access::DoubleOf(*this);
+        float f;
+        if (flags_ & kHasFloat)
+            std::memcpy(&f, &aux_, sizeof f);
+        else
+            f = static_cast<float>(d);
+        if (std::isinf(f) && !std::isinf(d))
+            return false;
+        out = f;
+        return true;
+    }
+    case ParamType::Float:
+        out = Access::FloatOf(*this);
+        return true;
+    default:
+        return false;
+    }
+}
+
+bool Param::AsBool(bool& out) const {
+    if (type_ == ParamType::Boolean || (type_ == ParamType::Integer && bits_ <= 1)) {
+        out = bits_ != 0;
+        return true;
+    }
+    return false;
+}
+
+bool Param::AsString(std::string& out) const {
+    if (type_ != ParamType::String && type_ != ParamType::FileName)
+        return false;
+    out.assign(Access::TextOf(*this));
+    return true;
+}
+
+const char* Param::TypeName() const {
+    switch (type_) {
+    case ParamType::Integer:
+        return "an integer";
+    case ParamType::Double:
+    case ParamType::Float:
+        return "a real number";
+    case ParamType::Boolean:
+        return "a boolean";
+    case ParamType::String:
+        return "a string";
+    case ParamType::FileName:
+        return "a file name";
+    }
+    return "a value";
+}
+
+// --- Keyword, Section, Document ----------------------------------------------------------
+
+namespace {
+const Param kNoParam;
+const Keyword kNoKeyword;
+const Section kNoSection;
+}  // namespace
+
+std::string_view Keyword::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
+int Keyword::ParamCount() const { return static_cast<int>(count_); }
+const Param& Keyword::ParamAt(int index) const {
+    if (index < 0 || static_cast<std::uint32_t>(index) >= count_)
+        return kNoParam;
+    return doc_->impl().params[first_ + index];
+}
+Position Keyword::Pos() const { return pos_; }
+const Section& Keyword::Owner() const {
+    return doc_ ? doc_->impl().sections[owner_] : kNoSection;
+}
+
+std::string_view Section::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
+Position Section::Pos() const { return pos_; }
+const Document& Section::Doc() const { return *doc_; }
+int Section::EntryCount() const { return static_cast<int>(entryCount_); }
+
+bool Section::EntryIsSection(int index) const {
+    if (index < 0 || static_cast<std::uint32_t>(index) >= entryCount_)
+        return false;
+    return (doc_->impl().entries[firstEntry_ + index] & kSectionBit) != 0;
+}
+
+const Keyword& Section::KeywordAt(int index) const {
+    if (index < 0 || static_cast<std::uint32_t>(index) >= entryCount_)
+        return kNoKeyword;
+    const Document::Impl& d = doc_->impl();
+    const std::uint32_t e = d.entries[firstEntry_ + index];
+    return (e & kSectionBit) ? kNoKeyword : d.keywords[e];
+}
+
+const Section& Section::SectionAt(int index) const {
+    if (index < 0 || static_cast<std::uint32_t>(index) >= entryCount_)
+        return kNoSection;
+    const Document::Impl& d = doc_->impl();
+    const std::uint32_t e = d.entries[firstEntry_ + index];
+    return (e & kSectionBit) ? d.sections[e & ~kSectionBit] : kNoSection;
+}
+
+const Section* Section::FindSection(std::string_view name, int n) const {
+    if (!doc_ || n < 1)
+        return nullptr;
+    const Document::Impl& d = doc_->impl();
+    const std::int64_t id = d.names.Find(name);
+    if (id < 0)
+        return nullptr;
+    const std::uint32_t* e = d.entries.data() + firstEntry_;
+    for (std::uint32_t i = 0; i < entryCount_; ++i) {
+        if (!(e[i] & kSectionBit))
+            continue;
+        const Section& s = d.sections[e[i] & ~kSectionBit];
+        if (s.name_ == id && --n == 0)
+            return &s;
+    }
+    return nullptr;
+}
+
+const Keyword* Section::FindKeyword(std::string_view name, int n) const {
+    if (!doc_ || n < 1)
+        return nullptr;
+    const Document::Impl& d = doc_->impl();
+    const std::int64_t id = d.names.Find(name);
+    if (id < 0)
+        return nullptr;
+    const std::uint32_t* e = d.entries.data() + firstEntry_;
+    for (std::uint32_t i = 0; i < entryCount_; ++i) {
+        if (e[i] & kSectionBit)
+            continue;
+        const Keyword& k = d.keywords[e[i]];
+        if (k.name_ == id && --n == 0)
+            return &k;
+    }
+    return nullptr;
+}
+
+std::string Diagnostic::ToString() const {
+    return file + ':' + std::to_string(pos.line) + ':' + std::to_string(pos.column) + ": " +
+           message;
+}
+
+Document::Document() : impl_(std::make_unique<Impl>()) {
+    impl_->self = this;
+    impl_->sections.push_back(Access::MakeSection(this, 0, {}));
+}
+
+Document::~Document() = default;
+
+const std::string& Document::FileName() const { return impl_->fileName; }
+void Document::SetFileName(std::string name) { impl_->fileName = std::move(name); }
+const Section& Document::Root() const { return impl_->sections[0]; }
+const std::vector<Diagnostic>& Document::Warnings() const { return impl_->warnings; }
+
+void Document::AddWarning(Position pos, std::string message) const {
+    impl_->warnings.push_back(Diagnostic{impl_->fileName, pos, std::move(message)});
+}
+
+// --- Builder -----------------------------------------------------------------------------
+
+struct Builder::State {
+    struct Open {
+        std::uint32_t section;
+        std::uint32_t capacity;  // entry slots the section owns from its first entry
+    };
+    std::vector<Open> open;
+    std::int64_t keyword = -1;  // receives the parameters added next
+    int skipped = 0;            // sections opened past the depth limit, dropped whole
+    std::string name;           // scratch for names that need repair
+};
+
+Builder::Builder(Document& doc) : doc_(doc), state_(std::make_unique<State>()) {
+    const Section& root = doc.Root();
+    state_->open.push_back({0, Access::EntryCount(root)});
+}
+
+Builder::~Builder() = default;
+
+namespace {
+
+bool IsNameStart(char c) {
+    return (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_';
+}
+bool IsNameChar(char c) { return IsNameStart(c) || (c >= '0' && c <= '9'); }
+
+// The writer must produce text that reads back, so a name that could not be read is
+// repaired rather than refused (refusing would unbalance the sections).
+std::string_view ValidName(std::string_view name, std::string& scratch) {
+    bool ok = !name.empty() && IsNameStart(name[0]);
+    for (std::size_t i = 1; ok && i < name.size(); ++i)
+        ok = IsNameChar(name[i]);
+    if (ok)
+        return name;
+    scratch.clear();
+    if (name.empty() || !IsNameStart(name[0]))
+        scratch += '_';
+    for (char c : name)
+        scratch += IsNameChar(c) ? c : '_';
+    return scratch;
+}
+
+// Appends to the innermost open section. While building, a section's entries may be
+// followed by those of a later section; it then moves to the end with room to grow.
+void AppendEntry(Document::Impl& d, Builder::State& st, std::uint32_t entry) {
+    Builder::State::Open& o = st.open.back();
+    Section& s = d.sections[o.section];
+    std::uint32_t& first = Access::FirstEntry(s);
+    std::uint32_t& count = Access::EntryCount(s);
+    if (first + count == d.entries.size()) {
+        d.entries.push_back(entry);
+        o.capacity = std::max(o.capacity, count + 1);
+    } else if (count < o.capacity) {
+        d.entries[first + count] = entry;
+    } else {
+        const std::size_t to = d.entries.size();
+        const std::uint32_t capacity = std::max<std::uint32_t>(4, count * 2);
+        d.entries.resize(to + capacity, 0);
+        std::copy_n(d.entries.begin() + first, count, d.entries.begin() + to);
+        d.entries[to + count] = entry;
+        first = static_cast<std::uint32_t>(to);
+        o.capacity = capacity;
+    }
+    ++count;
+}
+
+}  // namespace
+
+void Builder::BeginSection(std::string_view name) {
+    State& st = *state_;
+    st.keyword = -1;
+    if (st.skipped > 0 || Depth() >= kMaxDepth) {
+        ++st.skipped;
+        return;
+    }
+    Document::Impl& d = doc_.impl();
+    const std::uint32_t id = d.names.Intern(ValidName(name, st.name), d.text);
+    const auto index = static_cast<std::uint32_t>(d.sections.size());
+    AppendEntry(d, st, kSectionBit | index);
+    d.sections.push_back(Access::MakeSection(&doc_, id, {}));
+    Access::FirstEntry(d.sections.back()) = static_cast<std::uint32_t>(d.entries.size());
+    st.open.push_back({index, 0});
+}
+
+void Builder::EndSection() {
+    State& st = *state_;
+    st.keyword = -1;
+    if (st.skipped > 0)
+        --st.skipped;
+    else if (st.open.size() > 1)
+        st.open.pop_back();
+}
+
+void Builder::AddKeyword(std::string_view name) {
+    State& st = *state_;
+    st.keyword = -1;
+    if (st.skipped > 0 || st.open.size() == 1)
+        return;  // the top level holds only sections
+    Document::Impl& d = doc_.impl();
+    const std::uint32_t id = d.names.Intern(ValidName(name, st.name), d.text);
+    const auto index = static_cast<std::uint32_t>(d.keywords.size());
+    AppendEntry(d, st, index);
+    d.keywords.push_back(Access::MakeKeyword(&doc_, st.open.back().section, id,
+                                             static_cast<std::uint32_t>(d.params.size()), {}));
+    st.keyword = index;
+}
+
+namespace {
+void AddParam(Document::Impl& d, std::int64_t keyword, const Param& p) {
+    if (keyword < 0)
+        return;
+    d.params.push_back(p);
+    ++Access::ParamCount(d.keywords[keyword]);
+}
+}  // namespace
+
+void Builder::AddInt(std::int32_t v) { AddParam(doc_.impl(), state_->keyword, Access::Int(v)); }
+void Builder::AddDouble(double v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Double(v));
+}
+void Builder::AddFloat(float v) { AddParam(doc_.impl(), state_->keyword, Access::Float(v)); }
+void Builder::AddBool(bool v) { AddParam(doc_.impl(), state_->keyword, Access::Bool(v)); }
+
+void Builder::AddString(std::string_view v) {
+    if (state_->keyword < 0)
+        return;
+    Document::Impl& d = doc_.impl();
+    AddParam(d, state_->keyword, Access::Text(ParamType::String, d.text.Store(v), v.size()));
+}
+
+void Builder::AddFileName(std::string_view v) {
+    if (state_->keyword < 0)
+        return;
+    Document::Impl& d = doc_.impl();
+    AddParam(d, state_->keyword, Access::Text(ParamType::FileName, d.text.Store(v), v.size()));
+}
+
+void Builder::CopySection(const Section& section) {
+    if (&section.Doc() == &doc_) {
+        // Copying from ourselves would read entries that move as we append.
+        Document copy;
+        Builder(copy).CopySection(section);
+        CopySection(copy.Root().SectionAt(0));
+        return;
+    }
+    struct Frame {
+        const Section* section;
+        int next;
+    };
+    std::vector<Frame> stack{{&section, 0}};
+    BeginSection(section.Name());
+    while (!stack.empty()) {
+        Frame& f = stack.back();
+        if (f.next == f.section->EntryCount()) {
+            EndSection();
+            stack.pop_back();
+            continue;
+        }
+        const int i = f.next++;
+        if (f.section->EntryIsSection(i)) {
+            const Section& child = f.section->SectionAt(i);
+            BeginSection(child.Name());
+            stack.push_back({&child, 0});
+            continue;
+        }
+        const Keyword& k = f.section->KeywordAt(i);
+        AddKeyword(k.Name());
+        for (int j = 0; j < k.ParamCount(); ++j) {
+            const Param& p = k.ParamAt(j);
+            if (p.Type() == ParamType::String || p.Type() == ParamType::FileName) {
+                const std::string_view s = Access::TextOf(p);
+                if (p.Type() == ParamType::String)
+                    AddString(s);
+                else
+                    AddFileName(s);
+            } else {
+                AddParam(doc_.impl(), state_->keyword, p);
+            }
+        }
+    }
+}
+
+int Builder::Depth() const { return static_cast<int>(state_->open.size()) - 1 + state_->skipped; }
+
+}  // namespace paramfile

@@ -1,0 +1,183 @@
+// Internal layout of a parameter-file document, shared by the reader, the writer, the
+// builder and the kiv calls. Not part of the library's interface.
+#pragma once
+
+#include "paramfile/ParamFile.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace paramfile {
+
+// Entries of a section: keyword indices, or section indices with this bit set.
+inline constexpr std::uint32_t kSectionBit = 0x80000000u;
+inline constexpr int kMaxDepth = 1000;
+
+enum : std::uint8_t { kHasFloat = 1 };
+
+// Bump allocator for names and string values; blocks never move, so params may point
+// into them.
+class Arena {
+public:
+    char* Allocate(std::size_t n) {
+        if (n <= left_) {
+            char* r = cur_;
+            cur_ += n;
+            left_ -= n;
+            return r;
+        }
+        return Grow(n);
+    }
+    const char* Store(std::string_view s) {
+        if (s.empty())
+            return "";
+        char* p = Allocate(s.size());
+        std::memcpy(p, s.data(), s.size());
+        return p;
+    }
+    std::size_t Bytes() const { return bytes_; }
+
+private:
+    char* Grow(std::size_t n);
+    std::vector<std::unique_ptr<char[]>> blocks_;
+    char* cur_ = nullptr;
+    std::size_t left_ = 0;
+    std::size_t next_ = 4096;
+    std::size_t bytes_ = 0;
+};
+
+std::uint64_t HashName(const char* s, std::size_t n);
+
+// Interned names: keywords and sections repeat a handful of names, so each is held once.
+class NameTable {
+public:
+    NameTable();
+    std::uint32_t Intern(std::string_view name, std::uint64_t hash, Arena& arena);
+    std::uint32_t Intern(std::string_view name, Arena& arena) {
+        return Intern(name, HashName(name.data(), name.size()), arena);
+    }
+    // -1 when the name was never interned.
+    std::int64_t Find(std::string_view name) const;
+    std::string_view operator[](std::uint32_t id) const { return names_[id]; }
+    std::size_t Bytes() const;
+
+private:
+    void Rehash();
+    std::vector<std::string_view> names_;
+    std::vector<std::uint64_t> hashes_;
+    std::vector<std::uint32_t> slots_;  // id + 1, 0 when free
+};
+
+struct Document::Impl {
+    Document* self = nullptr;
+    std::string fileName;
+    std::vector<Section> sections;  // [0] is the root
+    std::vector<Keyword> keywords;
+    std::vector<Param> params;
+    std::vector<std::uint32_t> entries;
+    NameTable names;
+    Arena text;
+    std::size_t sourceBytes = 0;  // size of the text read, a hint for the writer
+    mutable std::vector<Diagnostic> warnings;
+
+    std::size_t MemoryBytes() const;
+};
+
+// Private access for the free functions of the library.
+struct Access {
+    static const Document::Impl& Of(const Section& s) { return s.doc_->impl(); }
+    static const Document::Impl& Of(const Keyword& k) { return k.doc_->impl(); }
+
+    static Param Int(std::int64_t v) {
+        Param p;
+        p.type_ = ParamType::Integer;
+        p.bits_ = static_cast<std::uint64_t>(v);
+        return p;
+    }
+    static Param Double(double v) {
+        Param p;
+        p.type_ = ParamType::Double;
+        std::memcpy(&p.bits_, &v, sizeof v);
+        return p;
+    }
+    static Param Float(float v) {
+        Param p;
+        p.type_ = ParamType::Float;
+        std::uint32_t b;
+        std::memcpy(&b, &v, sizeof v);
+        p.bits_ = b;
+        return p;
+    }
+    static Param Bool(bool v) {
+        Param p;
+        p.type_ = ParamType::Boolean;
+        p.bits_ = v ? 1 : 0;
+        return p;
+    }
+    static Param Text(ParamType type, const char* data, std::size_t n) {
+        Param p;
+        p.type_ = type;
+        p.bits_ = reinterpret_cast<std::uintptr_t>(data);
+        p.aux_ = static_cast<std::uint32_t>(n);
+        return p;
+    }
+    static void SetFloat(Param& p, float f) {
+        std::memcpy(&p.aux_, &f, sizeof f);
+        p.flags_ |= kHasFloat;
+    }
+    static std::int64_t IntOf(const Param& p) { return static_cast<std::int64_t>(p.bits_); }
+    static double DoubleOf(const Param& p) {
+        double d;
+        std::memcpy(&d, &p.bits_, sizeof d);
+        return d;
+    }
+    static float FloatOf(const Param& p) {
+        std::uint32_t b = static_cast<std::uint32_t>(p.bits_);
+        float f;
+        std::memcpy(&f, &b, sizeof f);
+        return f;
+    }
+    static std::string_view TextOf(const Param& p) {
+        return {reinterpret_cast<const char*>(static_cast<std::uintptr_t>(p.bits_)), p.aux_};
+    }
+
+    static Section MakeSection(const Document* doc, std::uint32_t name, Position pos) {
+        Section s;
+        s.doc_ = doc;
+        s.name_ = name;
+        s.pos_ = pos;
+        return s;
+    }
+    static Keyword MakeKeyword(const Document* doc, std::uint32_t owner, std::uint32_t name,
+                               std::uint32_t first, Position pos) {
+        Keyword k;
+        k.doc_ = doc;
+        k.owner_ = owner;
+        k.name_ = name;
+        k.first_ = first;
+        k.pos_ = pos;
+        return k;
+    }
+    static std::uint32_t& FirstEntry(Section& s) { return s.firstEntry_; }
+    static std::uint32_t& EntryCount(Section& s) { return s.entryCount_; }
+    static std::uint32_t& ParamCount(Keyword& k) { return k.count_; }
+    static std::uint32_t FirstParam(const Keyword& k) { return k.first_; }
+    static std::uint32_t NameId(const Keyword& k) { return k.name_; }
+    static std::uint32_t NameId(const Section& s) { return s.name_; }
+    static std::uint32_t FirstEntry(const Section& s) { return s.firstEntry_; }
+    static std::uint32_t EntryCount(const Section& s) { return s.entryCount_; }
+};
+
+// Shortest text that reads back to the same value, always with '.' or an exponent.
+// buf needs 32 bytes; returns the end.
+char* FormatDouble(char* buf, double v);
+char* FormatFloat(char* buf, float v);
+
+// True when a double could round to a different float than the decimal text it came from.
+bool MayMisroundAsFloat(double d);
+
+}  // namespace paramfile
