@@ -769,5 +769,18 @@ void CEditorWindow::closeEvent(QCloseEvent* event) {
         event->ignore();
         return;
     }
+    SaveLayout();
     event->accept();
+}
+
+void CEditorWindow::RestoreLayout() {
+    QSettings settings = EditorSettings();
+    restoreGeometry(settings.value("window/geometry").toByteArray());
+    restoreState(settings.value("window/state").toByteArray());
+}
+
+void CEditorWindow::SaveLayout() {
+    QSettings settings = EditorSettings();
+    settings.setValue("window/geometry", saveGeometry());
+    settings.setValue("window/state", saveState());
 }

@@ -73,6 +73,9 @@ public:
     using Prompter = std::function<QMessageBox::StandardButton(const Prompt&)>;
     void SetPrompter(Prompter prompter) { m_prompter = std::move(prompter); }
 
+    // The window's size and docks as the user left them.
+    void RestoreLayout();
+    void SaveLayout();
     // Recreates the visible form, e.g. after the units changed.
     void RefreshDialog();
 

@@ -119,6 +119,7 @@ int main(int argc, char** argv) {
     CEditorWindow window;
     if (!options.screenshot.empty())
         return TakeScreenshot(window, options);
+    window.RestoreLayout();
     if (!options.file.empty())
         window.OpenFile(QString::fromStdString(options.file));
     window.show();

@@ -9,6 +9,7 @@
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/SimulationPeriodKiv.h"
 #include "fem/UnitUtil.h"
+#include "host/ModuleSelection.h"
 #include "hydro/HDBoundaryConditionsKiv.h"
 #include "hydro/HDDensityKiv.h"
 #include "hydro/HDSourcesKiv.h"
@@ -16,6 +17,7 @@
 #include "setupeditor/NavigationTree.h"
 
 #include <QApplication>
+#include <QCheckBox>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
@@ -389,6 +391,30 @@ TEST_F(EditorTest, TheTreeFollowsTheModelAndLosesRemovedSections) {
     m_window->Document().GetBoundaryNames()->GetItem(1)->Identifier("Outer sea");
     m_window->UpdateDoc(nullptr, kHintTitleChanged);
     EXPECT_EQ(Titles(m_window->Document().GetBoundaryConditions())[0], "Outer sea");
+}
+
+TEST_F(EditorTest, AModuleNotInUseIsGreyed) {
+    ASSERT_TRUE(m_window->OpenFile(kExample));
+    QTreeWidgetItem* root = m_window->Tree()->topLevelItem(0);
+    const QBrush active = m_window->Tree()->palette().brush(QPalette::Active, QPalette::Text);
+    const QBrush greyed = m_window->Tree()->palette().brush(QPalette::Disabled, QPalette::Text);
+    ASSERT_NE(active, greyed);
+    EXPECT_EQ(root->foreground(0), active);
+    ASSERT_TRUE(m_window->SelectPath("MODULE_SELECTION"));
+    QCheckBox* mud = nullptr;
+    for (QCheckBox* box : m_window->CurrentDialog()->findChildren<QCheckBox*>())
+        if (box->text() == "Mud transport")
+            mud = box;
+    ASSERT_TRUE(mud);
+    mud->click();
+    EXPECT_EQ(m_window->Document().GetModuleSelection()->Mode(), 0);
+    EXPECT_EQ(root->foreground(0), greyed);
+    // Sections below it are greyed with it.
+    ASSERT_GT(root->childCount(), 0);
+    EXPECT_EQ(root->child(0)->foreground(0), greyed);
+    mud->click();
+    EXPECT_EQ(m_window->Document().GetModuleSelection()->Mode(), 2);
+    EXPECT_EQ(root->foreground(0), active);
 }
 
 TEST_F(EditorTest, PathsAndNodesSelectSections) {
