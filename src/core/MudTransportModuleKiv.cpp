@@ -8,6 +8,7 @@
 #include "bed/MTMorphologyKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
+#include "watercolumn/MTDispersionKiv.h"
 
 namespace {
 const char* const kKey = "MudTransportBase";
@@ -22,6 +23,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTWaterColumnKiv(this));
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
+    AddChild(new CMTDispersionKiv(this));
     AddChild(new CMTMorphologyKiv(this));
 }
 

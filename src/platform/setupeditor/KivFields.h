@@ -12,10 +12,22 @@
 #include "paramfile/Kiv.h"
 
 #include <cstddef>
+#include <limits>
+
+// A double narrowed for a float keyword; beyond the float range it becomes an infinity
+// rather than undefined behaviour.
+inline float ToFileFloat(double v) {
+    constexpr double kMax = std::numeric_limits<float>::max();
+    if (v > kMax)
+        return std::numeric_limits<float>::infinity();
+    if (v < -kMax)
+        return -std::numeric_limits<float>::infinity();
+    return static_cast<float>(v);
+}
 
 template <class O>
 struct KivField {
-    enum class Kind { Int, Double, Float, Bool, Flag, String, FileName };
+    enum class Kind { Int, Double, Float, DoubleAsFloat, Bool, Flag, String, FileName };
 
     const char* keyword;
     Kind kind;
@@ -42,6 +54,14 @@ struct KivField {
     static KivField Float(const char* kw, float O::*m, float def) {
         KivField f{kw, Kind::Float};
         f.floatMember = m;
+        f.numericDefault = def;
+        return f;
+    }
+    // A double held in the model, written as a float: the file keeps the float type, and
+    // the model never narrows what it reads or what the user typed.
+    static KivField DoubleAsFloat(const char* kw, double O::*m, double def) {
+        KivField f{kw, Kind::DoubleAsFloat};
+        f.doubleMember = m;
         f.numericDefault = def;
         return f;
     }
@@ -81,6 +101,9 @@ void WriteFields(void* h, const O& o, const KivField<O> (&fields)[N]) {
         case K::Int: kivPutParam(h, f.keyword, o.*f.intMember); break;
         case K::Double: kivPutParam(h, f.keyword, o.*f.doubleMember); break;
         case K::Float: kivPutParam(h, f.keyword, o.*f.floatMember); break;
+        case K::DoubleAsFloat:
+            kivPutParam(h, f.keyword, ToFileFloat(o.*f.doubleMember));
+            break;
         case K::Bool: kivPutParam(h, f.keyword, o.*f.boolMember); break;
         case K::Flag: kivPutParam(h, f.keyword, (o.*f.boolMember) ? 1 : 0); break;
         case K::String: kivPutParam(h, f.keyword, o.*f.stringMember); break;
@@ -96,7 +119,8 @@ void ReadFields(void* h, O& o, const KivField<O> (&fields)[N]) {
     for (const KivField<O>& f : fields) {
         switch (f.kind) {
         case K::Int: kivGetParam(h, f.keyword, &(o.*f.intMember), 1, 1); break;
-        case K::Double: kivGetParam(h, f.keyword, &(o.*f.doubleMember), 1, 1); break;
+        case K::Double:
+        case K::DoubleAsFloat: kivGetParam(h, f.keyword, &(o.*f.doubleMember), 1, 1); break;
         case K::Float: kivGetParam(h, f.keyword, &(o.*f.floatMember), 1, 1); break;
         case K::Bool: kivGetParam(h, f.keyword, &(o.*f.boolMember), 1, 1); break;
         case K::Flag: {
@@ -117,7 +141,8 @@ void DefaultFields(O& o, const KivField<O> (&fields)[N]) {
     for (const KivField<O>& f : fields) {
         switch (f.kind) {
         case K::Int: o.*f.intMember = static_cast<int>(f.numericDefault); break;
-        case K::Double: o.*f.doubleMember = f.numericDefault; break;
+        case K::Double:
+        case K::DoubleAsFloat: o.*f.doubleMember = f.numericDefault; break;
         case K::Float: o.*f.floatMember = static_cast<float>(f.numericDefault); break;
         case K::Bool:
         case K::Flag: o.*f.boolMember = f.numericDefault != 0; break;

@@ -1,0 +1,85 @@
+#include "MTSandFractionListKiv.h"
+
+#include "MTReadChecks.h"
+#include "fem/UnitUtil.h"
+#include "setupeditor/KivFields.h"
+
+namespace {
+const char* const kKey = "MT Sand Fractions";
+constexpr long kSettlingVelocityUnit = 100128;
+}  // namespace
+
+struct SandFractionItemFields {
+    using F = KivField<CMTSandFractionItemKiv>;
+    using K = CMTSandFractionItemKiv;
+    static inline const F kFields[] = {
+        F::Bool("include_sand", &K::m_includeSand, true),
+        F::DoubleAsFloat("mean_settling_velocity", &K::m_meanSettlingVelocity, 0.001),
+    };
+};
+
+struct SandFractionListFields {
+    using F = KivField<CMTSandFractionListKiv>;
+    using K = CMTSandFractionListKiv;
+    static inline const F kFields[] = {
+        F::Flag("sand_fraction_description", &K::m_includeSandFractions, false),
+    };
+};
+
+CMTSandFractionItemKiv::CMTSandFractionItemKiv(CZoSEKivBase* parent)
+    : CZoSEKivBase("Fraction %d", "FRACTION_%d", parent) {
+    SetDefault();
+}
+
+double CMTSandFractionItemKiv::MeanSettlingVelocity() const {
+    return ToUserUnit(kSettlingVelocityUnit, m_meanSettlingVelocity);
+}
+
+void CMTSandFractionItemKiv::MeanSettlingVelocity(double shown) {
+    m_meanSettlingVelocity = FromUserUnit(kSettlingVelocityUnit, shown);
+}
+
+void CMTSandFractionItemKiv::WriteData(void* h) {
+    WriteFields(h, *this, SandFractionItemFields::kFields);
+}
+
+void CMTSandFractionItemKiv::ReadData(void* h) {
+    ReadFields(h, *this, SandFractionItemFields::kFields);
+}
+
+void CMTSandFractionItemKiv::SetDefault() { DefaultFields(*this, SandFractionItemFields::kFields); }
+
+CMTSandFractionListKiv::CMTSandFractionListKiv(CZoSEKivBase* parent)
+    : CMTCountListKiv("Sand Fractions", "SAND_FRACTIONS", parent, MTCount::Fractions) {
+    DefaultFields(*this, SandFractionListFields::kFields);
+    GetRoot()->RegisterImportantNode(this, kKey);
+}
+
+CMTSandFractionListKiv::~CMTSandFractionListKiv() { GetRoot()->UnregisterImportantNode(kKey); }
+
+bool CMTSandFractionListKiv::IsSand(int fraction) const {
+    const CMTSandFractionItemKiv* item = GetItem(fraction);
+    return m_includeSandFractions && item && item->IncludeSand();
+}
+
+void CMTSandFractionListKiv::WriteData(void* h) {
+    WriteFields(h, *this, SandFractionListFields::kFields);
+}
+
+void CMTSandFractionListKiv::ReadData(void* h) {
+    ReadFields(h, *this, SandFractionListFields::kFields);
+    int raw = m_includeSandFractions ? 1 : 0;
+    kivGetParam(h, "sand_fraction_description", &raw, 1, 1);
+    WarnUnknownFlag(h, "sand_fraction_description", raw);
+}
+
+const char* CMTSandFractionListKiv::GetDlgRuntimeClass(unsigned code) {
+    return code == kDlgRuntimeClassRequest ? "CMTSandFractionListDlg"
+                                           : CMTCountListKiv::GetDlgRuntimeClass(code);
+}
+
+void CMTSandFractionListKiv::SetDefault() { DefaultFields(*this, SandFractionListFields::kFields); }
+
+CMTSandFractionListKiv* SandFractions(const CZoSEKivBase* node) {
+    return GetImportant<CMTSandFractionListKiv>(node, kKey);
+}
