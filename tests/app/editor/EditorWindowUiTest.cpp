@@ -200,6 +200,25 @@ TEST_F(EditorTest, AnEditOnAHostPageIsSavedAndReadBack) {
               original.document->ToText());
 }
 
+TEST_F(EditorTest, AFieldStillBeingEditedIsStoredBeforeSaving) {
+    const QString path = CopyOfExample();
+    ASSERT_TRUE(m_window->OpenFile(path));
+    m_window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(m_window.get()));
+    ASSERT_TRUE(m_window->SelectPath("SIMULATION_PERIOD"));
+    auto* steps = m_window->CurrentDialog()->findChild<QSpinBox*>();
+    ASSERT_TRUE(steps);
+    steps->setFocus();
+    steps->selectAll();
+    QTest::keyClicks(steps, "1234");
+    ASSERT_EQ(QApplication::focusWidget(), steps);
+    // Saving from the menu leaves the focus where it is; the typed value must still count.
+    ASSERT_TRUE(m_window->SaveFile(path));
+    EXPECT_EQ(m_window->Document().GetPeriod()->TimeStepCount(), 1234);
+    EXPECT_TRUE(ReadAll(path).contains("number_of_time_steps = 1234\n"));
+    EXPECT_FALSE(m_window->IsModified());
+}
+
 TEST_F(EditorTest, BoundariesAndSourcesChangedOnTheirPagesAreFollowed) {
     ASSERT_TRUE(m_window->OpenFile(CopyOfExample()));
     CSetupDocument& doc = m_window->Document();
