@@ -685,7 +685,7 @@ public:
         m_include = new QCheckBox(tr("Include wind forcing"), this);
         f->addRow(m_include);
         m_type = new QComboBox(this);
-        f->addRow(tr("Wind"), m_type);
+        f->addRow(tr("Wind type"), m_type);
         connect(m_include, &QCheckBox::clicked, this, [this](bool on) {
             Section<CHDWindForcingKiv>()->Include(on);
             UpdateDoc(kHintValueChanged);
