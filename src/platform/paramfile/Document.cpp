@@ -4,6 +4,9 @@
 #include <charconv>
 #include <cmath>
 #include <limits>
+#include <new>
+
+#include <sys/mman.h>
 
 namespace paramfile {
 
@@ -23,6 +26,44 @@ char* Arena::Grow(std::size_t n) {
     left_ = next_ - n;
     next_ = std::min(next_ * 2, kMaxBlock);
     return blocks_.back().get();
+}
+
+namespace {
+constexpr std::size_t kHugePage = std::size_t(2) << 20;
+constexpr std::size_t kMapAbove = 2 * kHugePage;
+std::size_t RoundToHugePage(std::size_t n) {
+    return (n + kHugePage - 1) & ~(kHugePage - 1);
+}
+} // namespace
+
+void* AllocateTable(std::size_t bytes) {
+    if (bytes < kMapAbove)
+        return ::operator new(bytes);
+    const std::size_t size = RoundToHugePage(bytes);
+    // Over-map by one huge page so the table can start on a huge-page boundary.
+    void* m = ::mmap(nullptr, size + kHugePage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS,
+                     -1, 0);
+    if (m == MAP_FAILED)
+        throw std::bad_alloc();
+    const auto raw = reinterpret_cast<std::uintptr_t>(m);
+    const std::uintptr_t start = (raw + kHugePage - 1) & ~(std::uintptr_t(kHugePage) - 1);
+    if (start > raw)
+        ::munmap(m, start - raw);
+    if (const std::size_t tail = raw + size + kHugePage - (start + size); tail > 0)
+        ::munmap(reinterpret_cast<void*>(start + size), tail);
+    ::madvise(reinterpret_cast<void*>(start), size, MADV_HUGEPAGE);
+    return reinterpret_cast<void*>(start);
+}
+
+void FreeTable(void* p, std::size_t bytes) {
+    if (bytes < kMapAbove)
+        ::operator delete(p);
+    else
+        ::munmap(p, RoundToHugePage(bytes));
+}
+
+std::size_t TableBytes(std::size_t bytes) {
+    return bytes < kMapAbove ? bytes : RoundToHugePage(bytes);
 }
 
 namespace {
@@ -46,7 +87,21 @@ std::uint64_t Mix(std::uint64_t a, std::uint64_t b) {
     return h ^ (h >> 32);
 }
 
-}  // namespace
+// Names are short: two overlapping loads beat a call to memcmp.
+bool SameName(std::string_view a, std::string_view b) {
+    const std::size_t n = a.size();
+    if (n != b.size())
+        return false;
+    if (n >= 8 && n <= 16)
+        return Load8(a.data()) == Load8(b.data()) &&
+               Load8(a.data() + n - 8) == Load8(b.data() + n - 8);
+    if (n >= 4 && n < 8)
+        return Load4(a.data()) == Load4(b.data()) &&
+               Load4(a.data() + n - 4) == Load4(b.data() + n - 4);
+    return a == b;
+}
+
+} // namespace
 
 std::uint64_t HashName(const char* s, std::size_t n) {
     std::uint64_t a = 0;
@@ -86,7 +141,7 @@ std::uint32_t NameTable::Intern(std::string_view name, std::uint64_t hash, Arena
                 Rehash();
             return id;
         }
-        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+        if (hashes_[slot - 1] == hash && SameName(names_[slot - 1], name))
             return slot - 1;
     }
 }
@@ -98,7 +153,7 @@ std::int64_t NameTable::Find(std::string_view name) const {
         const std::uint32_t slot = slots_[i];
         if (slot == 0)
             return -1;
-        if (hashes_[slot - 1] == hash && names_[slot - 1] == name)
+        if (hashes_[slot - 1] == hash && SameName(names_[slot - 1], name))
             return slot - 1;
     }
 }
@@ -122,8 +177,10 @@ std::size_t NameTable::Bytes() const {
 
 std::size_t Document::Impl::MemoryBytes() const {
     std::size_t n = sizeof(Document) + sizeof(Impl) + fileName.capacity();
-    n += sections.capacity() * sizeof(Section) + keywords.capacity() * sizeof(Keyword);
-    n += params.capacity() * sizeof(Param) + entries.capacity() * sizeof(std::uint32_t);
+    n += TableBytes(sections.capacity() * sizeof(Section));
+    n += TableBytes(keywords.capacity() * sizeof(Keyword));
+    n += TableBytes(params.capacity() * sizeof(Param));
+    n += TableBytes(entries.capacity() * sizeof(std::uint32_t));
     n += names.Bytes() + text.Bytes();
     for (const Diagnostic& w : warnings)
         n += sizeof w + w.file.capacity() + w.message.capacity();
@@ -143,8 +200,7 @@ char* FinishReal(char* begin, char* end) {
     return end + 2;
 }
 
-template <class T>
-char* FormatReal(char* buf, T v) {
+template <class T> char* FormatReal(char* buf, T v) {
     if (std::isnan(v)) {
         std::memcpy(buf, "nan", 3);
         return buf + 3;
@@ -160,15 +216,19 @@ char* FormatReal(char* buf, T v) {
     return FinishReal(buf, std::to_chars(buf, buf + 30, v).ptr);
 }
 
-}  // namespace
+} // namespace
 
-char* FormatDouble(char* buf, double v) { return FormatReal(buf, v); }
-char* FormatFloat(char* buf, float v) { return FormatReal(buf, v); }
+char* FormatDouble(char* buf, double v) {
+    return FormatReal(buf, v);
+}
+char* FormatFloat(char* buf, float v) {
+    return FormatReal(buf, v);
+}
 
 bool MayMisroundAsFloat(double d) {
     const double a = std::fabs(d);
     if (!(a < 0x1p128))
-        return false;  // past the overflow boundary whatever the decimal digits were
+        return false; // past the overflow boundary whatever the decimal digits were
     if (a >= 0x1p-126) {
         // A double exactly halfway between two floats may hide which side the text was on.
         std::uint64_t b;
@@ -178,9 +238,19 @@ bool MayMisroundAsFloat(double d) {
     return a != 0 && static_cast<double>(static_cast<float>(d)) != d;
 }
 
+float FloatOfText(const char* begin, const char* end, double d) {
+    float f;
+    if (std::from_chars(begin, end, f).ec == std::errc())
+        return f;
+    const float big = std::fabs(d) > 1 ? std::numeric_limits<float>::infinity() : 0.0f;
+    return std::signbit(d) ? -big : big;
+}
+
 // --- Param -------------------------------------------------------------------------------
 
-ParamType Param::Type() const { return type_; }
+ParamType Param::Type() const {
+    return type_;
+}
 
 bool Param::AsInt(std::int32_t& out) const {
     if (type_ != ParamType::Integer)
@@ -282,24 +352,38 @@ namespace {
 const Param kNoParam;
 const Keyword kNoKeyword;
 const Section kNoSection;
-}  // namespace
+} // namespace
 
-std::string_view Keyword::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
-int Keyword::ParamCount() const { return static_cast<int>(count_); }
+std::string_view Keyword::Name() const {
+    return doc_ ? doc_->impl().names[name_] : "";
+}
+int Keyword::ParamCount() const {
+    return static_cast<int>(count_);
+}
 const Param& Keyword::ParamAt(int index) const {
     if (index < 0 || static_cast<std::uint32_t>(index) >= count_)
         return kNoParam;
     return doc_->impl().params[first_ + index];
 }
-Position Keyword::Pos() const { return pos_; }
+Position Keyword::Pos() const {
+    return pos_;
+}
 const Section& Keyword::Owner() const {
     return doc_ ? doc_->impl().sections[owner_] : kNoSection;
 }
 
-std::string_view Section::Name() const { return doc_ ? doc_->impl().names[name_] : ""; }
-Position Section::Pos() const { return pos_; }
-const Document& Section::Doc() const { return *doc_; }
-int Section::EntryCount() const { return static_cast<int>(entryCount_); }
+std::string_view Section::Name() const {
+    return doc_ ? doc_->impl().names[name_] : "";
+}
+Position Section::Pos() const {
+    return pos_;
+}
+const Document& Section::Doc() const {
+    return *doc_;
+}
+int Section::EntryCount() const {
+    return static_cast<int>(entryCount_);
+}
 
 bool Section::EntryIsSection(int index) const {
     if (index < 0 || static_cast<std::uint32_t>(index) >= entryCount_)
@@ -371,10 +455,18 @@ Document::Document() : impl_(std::make_unique<Impl>()) {
 
 Document::~Document() = default;
 
-const std::string& Document::FileName() const { return impl_->fileName; }
-void Document::SetFileName(std::string name) { impl_->fileName = std::move(name); }
-const Section& Document::Root() const { return impl_->sections[0]; }
-const std::vector<Diagnostic>& Document::Warnings() const { return impl_->warnings; }
+const std::string& Document::FileName() const {
+    return impl_->fileName;
+}
+void Document::SetFileName(std::string name) {
+    impl_->fileName = std::move(name);
+}
+const Section& Document::Root() const {
+    return impl_->sections[0];
+}
+const std::vector<Diagnostic>& Document::Warnings() const {
+    return impl_->warnings;
+}
 
 void Document::AddWarning(Position pos, std::string message) const {
     impl_->warnings.push_back(Diagnostic{impl_->fileName, pos, std::move(message)});
@@ -385,12 +477,12 @@ void Document::AddWarning(Position pos, std::string message) const {
 struct Builder::State {
     struct Open {
         std::uint32_t section;
-        std::uint32_t capacity;  // entry slots the section owns from its first entry
+        std::uint32_t capacity; // entry slots the section owns from its first entry
     };
     std::vector<Open> open;
-    std::int64_t keyword = -1;  // receives the parameters added next
-    int skipped = 0;            // sections opened past the depth limit, dropped whole
-    std::string name;           // scratch for names that need repair
+    std::int64_t keyword = -1; // receives the parameters added next
+    int skipped = 0;           // sections opened past the depth limit, dropped whole
+    std::string name;          // scratch for names that need repair
 };
 
 Builder::Builder(Document& doc) : doc_(doc), state_(std::make_unique<State>()) {
@@ -405,7 +497,9 @@ namespace {
 bool IsNameStart(char c) {
     return (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_';
 }
-bool IsNameChar(char c) { return IsNameStart(c) || (c >= '0' && c <= '9'); }
+bool IsNameChar(char c) {
+    return IsNameStart(c) || (c >= '0' && c <= '9');
+}
 
 // The writer must produce text that reads back, so a name that could not be read is
 // repaired rather than refused (refusing would unbalance the sections).
@@ -447,7 +541,7 @@ void AppendEntry(Document::Impl& d, Builder::State& st, std::uint32_t entry) {
     ++count;
 }
 
-}  // namespace
+} // namespace
 
 void Builder::BeginSection(std::string_view name) {
     State& st = *state_;
@@ -478,7 +572,7 @@ void Builder::AddKeyword(std::string_view name) {
     State& st = *state_;
     st.keyword = -1;
     if (st.skipped > 0 || st.open.size() == 1)
-        return;  // the top level holds only sections
+        return; // the top level holds only sections
     Document::Impl& d = doc_.impl();
     const std::uint32_t id = d.names.Intern(ValidName(name, st.name), d.text);
     const auto index = static_cast<std::uint32_t>(d.keywords.size());
@@ -495,14 +589,26 @@ void AddParam(Document::Impl& d, std::int64_t keyword, const Param& p) {
     d.params.push_back(p);
     ++Access::ParamCount(d.keywords[keyword]);
 }
-}  // namespace
+} // namespace
 
-void Builder::AddInt(std::int32_t v) { AddParam(doc_.impl(), state_->keyword, Access::Int(v)); }
-void Builder::AddDouble(double v) {
-    AddParam(doc_.impl(), state_->keyword, Access::Double(v));
+void Builder::AddInt(std::int32_t v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Int(v));
 }
-void Builder::AddFloat(float v) { AddParam(doc_.impl(), state_->keyword, Access::Float(v)); }
-void Builder::AddBool(bool v) { AddParam(doc_.impl(), state_->keyword, Access::Bool(v)); }
+void Builder::AddDouble(double v) {
+    Param p = Access::Double(v);
+    if (MayMisroundAsFloat(v)) {
+        // Read as float, the value must agree with what its written text will give.
+        char text[32];
+        Access::SetFloat(p, FloatOfText(text, FormatDouble(text, v), v));
+    }
+    AddParam(doc_.impl(), state_->keyword, p);
+}
+void Builder::AddFloat(float v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Float(v));
+}
+void Builder::AddBool(bool v) {
+    AddParam(doc_.impl(), state_->keyword, Access::Bool(v));
+}
 
 void Builder::AddString(std::string_view v) {
     if (state_->keyword < 0)
@@ -519,7 +625,9 @@ void Builder::AddFileName(std::string_view v) {
 }
 
 void Builder::CopySection(const Section& section) {
-    if (&section.Doc() == &doc_) {
+    if (!Access::DocOf(section))
+        return;
+    if (Access::DocOf(section) == &doc_) {
         // Copying from ourselves would read entries that move as we append.
         Document copy;
         Builder(copy).CopySection(section);
@@ -563,6 +671,8 @@ void Builder::CopySection(const Section& section) {
     }
 }
 
-int Builder::Depth() const { return static_cast<int>(state_->open.size()) - 1 + state_->skipped; }
+int Builder::Depth() const {
+    return static_cast<int>(state_->open.size()) - 1 + state_->skipped;
+}
 
-}  // namespace paramfile
+} // namespace paramfile

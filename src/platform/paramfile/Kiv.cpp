@@ -13,9 +13,15 @@ using paramfile::Section;
 
 namespace {
 
-Builder* Out(void* h) { return static_cast<Builder*>(h); }
-const Section* In(void* h) { return static_cast<const Section*>(h); }
-std::string_view Text(const char* s) { return s ? std::string_view(s) : std::string_view(); }
+Builder* Out(void* h) {
+    return static_cast<Builder*>(h);
+}
+const Section* In(void* h) {
+    return static_cast<const Section*>(h);
+}
+std::string_view Text(const char* s) {
+    return s ? std::string_view(s) : std::string_view();
+}
 
 struct Found {
     const Keyword* keyword = nullptr;
@@ -33,9 +39,9 @@ Found Lookup(void* h, const char* keyword, int occurrence, int index) {
 }
 
 std::string Subject(const Found& f) {
-    std::string s = "'" + std::string(f.keyword->Name()) + "'";
+    std::string s = paramfile::Cat("'", f.keyword->Name(), "'");
     if (f.index > 1)
-        s += " value " + std::to_string(f.index);
+        s += paramfile::Cat(" value ", std::to_string(f.index));
     return s;
 }
 
@@ -44,7 +50,7 @@ void Warn(const Found& f, const std::string& message) {
 }
 
 void WarnType(const Found& f, const char* expected) {
-    Warn(f, Subject(f) + " expects " + expected + ", found " + f.param->TypeName());
+    Warn(f, paramfile::Cat(Subject(f), " expects ", expected, ", found ", f.param->TypeName()));
 }
 
 std::string ValueText(const Param& p) {
@@ -65,13 +71,17 @@ std::string ValueText(const Param& p) {
     return std::string(buf, e);
 }
 
+// For values of the right kind that the target cannot hold: the value says more than its type.
+std::string AboutValue(const Found& f, const char* what) {
+    return paramfile::Cat("'", f.keyword->Name(), "' value ", ValueText(*f.param), what);
+}
+
 void Read(const Found& f, int* value) {
     std::int32_t v;
     if (f.param->AsInt(v))
         *value = v;
     else if (f.param->Type() == ParamType::Integer)
-        Warn(f, "'" + std::string(f.keyword->Name()) + "' value " + ValueText(*f.param) +
-                    " is out of range for an integer");
+        Warn(f, AboutValue(f, " is out of range for an integer"));
     else
         WarnType(f, "an integer");
 }
@@ -80,8 +90,7 @@ void Read(const Found& f, double* value) {
     if (f.param->AsDouble(*value))
         return;
     if (f.param->Type() == ParamType::Integer)
-        Warn(f, "'" + std::string(f.keyword->Name()) + "' value " + ValueText(*f.param) +
-                    " cannot be held exactly by a real number");
+        Warn(f, AboutValue(f, " cannot be held exactly by a real number"));
     else
         WarnType(f, "a number");
 }
@@ -90,11 +99,9 @@ void Read(const Found& f, float* value) {
     if (f.param->AsFloat(*value))
         return;
     if (f.param->Type() == ParamType::Integer)
-        Warn(f, "'" + std::string(f.keyword->Name()) + "' value " + ValueText(*f.param) +
-                    " cannot be held exactly by a float");
+        Warn(f, AboutValue(f, " cannot be held exactly by a float"));
     else if (f.param->Type() == ParamType::Double)
-        Warn(f, "'" + std::string(f.keyword->Name()) + "' value " + ValueText(*f.param) +
-                    " is out of range for a float");
+        Warn(f, AboutValue(f, " is out of range for a float"));
     else
         WarnType(f, "a number");
 }
@@ -114,8 +121,7 @@ void ReadFileName(const Found& f, std::string* value) {
         WarnType(f, "a file name");
 }
 
-template <class T>
-void Get(void* h, const char* keyword, T* value, int occurrence, int index) {
+template <class T> void Get(void* h, const char* keyword, T* value, int occurrence, int index) {
     if (!value)
         return;
     const Found f = Lookup(h, keyword, occurrence, index);
@@ -123,7 +129,7 @@ void Get(void* h, const char* keyword, T* value, int occurrence, int index) {
         Read(f, value);
 }
 
-}  // namespace
+} // namespace
 
 // --- writing -----------------------------------------------------------------------------
 
@@ -167,7 +173,9 @@ void kivAddFilename(void* h, const std::string& path) {
         Out(h)->AddFileName(path);
 }
 
-void kivAddResultFilename(void* h, const std::string& path) { kivAddFilename(h, path); }
+void kivAddResultFilename(void* h, const std::string& path) {
+    kivAddFilename(h, path);
+}
 
 void kivPutParam(void* h, const char* keyword, int value) {
     kivAddKeyword(h, keyword);
@@ -234,7 +242,7 @@ void kivPutListParam(void* h, const char* keyword, const char* format, ...) {
             b.AddFileName(Text(va_arg(args, const char*)));
             continue;
         default:
-            break;  // an unknown letter leaves the argument types unknown: stop
+            break; // an unknown letter leaves the argument types unknown: stop
         }
         break;
     }
@@ -255,7 +263,9 @@ void* kivKeywordByNameNum(void* h, const char* keyword, int n) {
     return const_cast<Keyword*>(In(h)->FindKeyword(keyword, n));
 }
 
-int kivParamCount(void* k) { return k ? static_cast<const Keyword*>(k)->ParamCount() : 0; }
+int kivParamCount(void* k) {
+    return k ? static_cast<const Keyword*>(k)->ParamCount() : 0;
+}
 
 void* kivParamByNum(void* k, int n) {
     const auto* kw = static_cast<const Keyword*>(k);
@@ -363,7 +373,7 @@ void kivGetListParam(void* h, const char* keyword, int occurrence, const char* f
 }
 
 void kivWarn(void* h, const char* keyword, const std::string& message) {
-    if (!h)
+    if (!h || !Access::DocOf(*In(h)))
         return;
     const Section* s = In(h);
     const Keyword* k = keyword ? s->FindKeyword(keyword) : nullptr;

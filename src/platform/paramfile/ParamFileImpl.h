@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -69,19 +70,36 @@ private:
     void Rehash();
     std::vector<std::string_view> names_;
     std::vector<std::uint64_t> hashes_;
-    std::vector<std::uint32_t> slots_;  // id + 1, 0 when free
+    std::vector<std::uint32_t> slots_; // id + 1, 0 when free
 };
+
+// Large tables are mapped directly and asked for huge pages: filling tens of megabytes
+// page by page costs a reader about a fifth of its time in page faults.
+void* AllocateTable(std::size_t bytes);
+void FreeTable(void* p, std::size_t bytes);
+std::size_t TableBytes(std::size_t bytes); // what a table of that size really holds
+
+template <class T> struct TableAllocator {
+    using value_type = T;
+    TableAllocator() = default;
+    template <class U> TableAllocator(const TableAllocator<U>&) {}
+    T* allocate(std::size_t n) { return static_cast<T*>(AllocateTable(n * sizeof(T))); }
+    void deallocate(T* p, std::size_t n) { FreeTable(p, n * sizeof(T)); }
+    friend bool operator==(TableAllocator, TableAllocator) { return true; }
+};
+
+template <class T> using Table = std::vector<T, TableAllocator<T>>;
 
 struct Document::Impl {
     Document* self = nullptr;
     std::string fileName;
-    std::vector<Section> sections;  // [0] is the root
-    std::vector<Keyword> keywords;
-    std::vector<Param> params;
-    std::vector<std::uint32_t> entries;
+    Table<Section> sections; // [0] is the root
+    Table<Keyword> keywords;
+    Table<Param> params;
+    Table<std::uint32_t> entries;
     NameTable names;
     Arena text;
-    std::size_t sourceBytes = 0;  // size of the text read, a hint for the writer
+    std::size_t sourceBytes = 0; // size of the text read, a hint for the writer
     mutable std::vector<Diagnostic> warnings;
 
     std::size_t MemoryBytes() const;
@@ -90,6 +108,8 @@ struct Document::Impl {
 // Private access for the free functions of the library.
 struct Access {
     static const Document::Impl& Of(const Section& s) { return s.doc_->impl(); }
+    // Null for the placeholder handed out for an index out of range.
+    static const Document* DocOf(const Section& s) { return s.doc_; }
     static const Document::Impl& Of(const Keyword& k) { return k.doc_->impl(); }
 
     static Param Int(std::int64_t v) {
@@ -172,6 +192,19 @@ struct Access {
     static std::uint32_t EntryCount(const Section& s) { return s.entryCount_; }
 };
 
+// Joins message parts by appending (g++ 12 warns falsely on "literal" + std::string).
+inline void AppendPart(std::string& s, std::string_view v) {
+    s.append(v);
+}
+inline void AppendPart(std::string& s, char c) {
+    s += c;
+}
+template <class... Parts> std::string Cat(const Parts&... parts) {
+    std::string s;
+    (AppendPart(s, parts), ...);
+    return s;
+}
+
 // Shortest text that reads back to the same value, always with '.' or an exponent.
 // buf needs 32 bytes; returns the end.
 char* FormatDouble(char* buf, double v);
@@ -179,5 +212,7 @@ char* FormatFloat(char* buf, float v);
 
 // True when a double could round to a different float than the decimal text it came from.
 bool MayMisroundAsFloat(double d);
+// The float nearest to the decimal text [begin, end), whose value as a double is d.
+float FloatOfText(const char* begin, const char* end, double d);
 
-}  // namespace paramfile
+} // namespace paramfile

@@ -21,13 +21,13 @@ namespace paramfile {
 namespace {
 
 enum : std::uint8_t {
-    kStart = 1,      // first character of a name
-    kName = 2,       // later characters of a name
+    kStart = 1, // first character of a name
+    kName = 2,  // later characters of a name
     kDigit = 4,
-    kBlank = 8,      // space, tab, CR
-    kEnd = 16,       // ends a value: blank, newline, comma, '#', NUL
-    kStrStop = 32,   // needs attention inside "...": quote, backslash, newline, NUL
-    kFileStop = 64,  // needs attention inside '...': quote, newline, NUL
+    kBlank = 8,     // space, tab, CR
+    kEnd = 16,      // ends a value: blank, newline, comma, '#', NUL
+    kStrStop = 32,  // needs attention inside "...": quote, backslash, newline, NUL
+    kFileStop = 64, // needs attention inside '...': quote, newline, NUL
 };
 
 constexpr std::array<std::uint8_t, 256> MakeClasses() {
@@ -52,11 +52,12 @@ constexpr std::array<std::uint8_t, 256> MakeClasses() {
 
 constexpr std::array<std::uint8_t, 256> kClass = MakeClasses();
 
-inline std::uint8_t Cls(char c) { return kClass[static_cast<unsigned char>(c)]; }
+inline std::uint8_t Cls(char c) {
+    return kClass[static_cast<unsigned char>(c)];
+}
 
-constexpr double kPow10[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                             1e8,  1e9,  1e10, 1e11, 1e12, 1e13, 1e14, 1e15,
-                             1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
+constexpr double kPow10[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,  1e8,  1e9,  1e10, 1e11,
+                             1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
 
 struct Counts {
     std::size_t equals = 0, commas = 0, braces = 0;
@@ -67,8 +68,8 @@ Counts CountMarks(const char* p, std::size_t n) {
     Counts c;
     std::size_t i = 0;
 #if defined(__SSE2__)
-    const __m128i eq = _mm_set1_epi8('='), comma = _mm_set1_epi8(','),
-                  brace = _mm_set1_epi8('{'), zero = _mm_setzero_si128();
+    const __m128i eq = _mm_set1_epi8('='), comma = _mm_set1_epi8(','), brace = _mm_set1_epi8('{'),
+                  zero = _mm_setzero_si128();
     while (i + 16 <= n) {
         __m128i ae = zero, ac = zero, ab = zero;
         // Byte counters overflow after 255 rounds.
@@ -96,8 +97,32 @@ Counts CountMarks(const char* p, std::size_t n) {
     return c;
 }
 
-template <class T>
-void Trim(std::vector<T>& v) {
+// End of the name starting at p; sixteen bytes a step where the text allows.
+const char* NameEnd(const char* p, const char* end) {
+#if defined(__SSE2__)
+    const __m128i under = _mm_set1_epi8('_'), lower = _mm_set1_epi8(0x20);
+    const __m128i a1 = _mm_set1_epi8('a' - 1), z1 = _mm_set1_epi8('z' + 1);
+    const __m128i d1 = _mm_set1_epi8('0' - 1), d9 = _mm_set1_epi8('9' + 1);
+    while (end - p >= 16) {
+        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(p));
+        const __m128i folded = _mm_or_si128(v, lower);
+        const __m128i letter =
+            _mm_and_si128(_mm_cmpgt_epi8(folded, a1), _mm_cmplt_epi8(folded, z1));
+        const __m128i digit = _mm_and_si128(_mm_cmpgt_epi8(v, d1), _mm_cmplt_epi8(v, d9));
+        const __m128i ok = _mm_or_si128(_mm_or_si128(letter, digit), _mm_cmpeq_epi8(v, under));
+        const unsigned stop = ~static_cast<unsigned>(_mm_movemask_epi8(ok)) & 0xFFFFu;
+        if (stop != 0)
+            return p + __builtin_ctz(stop);
+        p += 16;
+    }
+#endif
+    (void)end;
+    while (Cls(*p) & kName)
+        ++p;
+    return p;
+}
+
+template <class Vector> void Trim(Vector& v) {
     if (v.capacity() > v.size() + v.size() / 8 + 256)
         v.shrink_to_fit();
 }
@@ -112,9 +137,7 @@ public:
     Diagnostic error;
 
 private:
-    Position PosOf(const char* at) const {
-        return {line_, static_cast<int>(at - lineStart_) + 1};
-    }
+    Position PosOf(const char* at) const { return {line_, static_cast<int>(at - lineStart_) + 1}; }
     bool Fail(const char* at, std::string message) {
         error = Diagnostic{d_.fileName, PosOf(at), std::move(message)};
         return false;
@@ -124,8 +147,10 @@ private:
         return false;
     }
     void SkipBlanks() {
-        while (Cls(*p_) & kBlank)
-            ++p_;
+        const char* q = p_;
+        while (Cls(*q) & kBlank)
+            ++q;
+        p_ = q;
     }
     bool LineEnds(const char* q) const {
         return *q == '\n' || *q == '#' || (*q == '\0' && q == end_);
@@ -177,7 +202,7 @@ std::string Reader::Token(const char* at) const {
 std::string DescribeChar(char c) {
     const auto u = static_cast<unsigned char>(c);
     if (u > 32 && u < 127)
-        return std::string("unexpected '") + c + "'";
+        return Cat("unexpected '", c, "'");
     char buf[32];
     std::snprintf(buf, sizeof buf, "unexpected byte 0x%02X", u);
     return buf;
@@ -185,7 +210,7 @@ std::string DescribeChar(char c) {
 
 bool Reader::Run() {
     if (end_ - p_ >= 3 && std::memcmp(p_, "\xEF\xBB\xBF", 3) == 0)
-        lineStart_ = p_ += 3;  // byte-order mark some editors add
+        lineStart_ = p_ += 3; // byte-order mark some editors add
     const Counts counts = CountMarks(p_, static_cast<std::size_t>(end_ - p_));
     d_.keywords.reserve(counts.equals);
     d_.params.reserve(counts.equals + counts.commas);
@@ -195,6 +220,14 @@ bool Reader::Run() {
 
     for (;;) {
         const char c = *p_;
+        if (c == ' ') {
+            // Indentation comes in runs of four.
+            while (end_ - p_ >= 8 && std::memcmp(p_, "        ", 8) == 0)
+                p_ += 8;
+            while (*p_ == ' ')
+                ++p_;
+            continue;
+        }
         if (Cls(c) & kBlank) {
             ++p_;
             continue;
@@ -221,9 +254,8 @@ bool Reader::Run() {
         if (!(Cls(c) & kStart))
             return Fail(p_, DescribeChar(c));
         const char* name = p_;
-        while (Cls(*p_) & kName)
-            ++p_;
-        const char* nameEnd = p_;
+        const char* nameEnd = NameEnd(p_, end_);
+        p_ = nameEnd;
         SkipBlanks();
         if (*p_ == '{') {
             if (!OpenSection(name, nameEnd))
@@ -231,22 +263,24 @@ bool Reader::Run() {
             ++p_;
         } else if (open_.size() == 1) {
             if (*p_ == '=')
-                return Fail(name, "keyword '" + std::string(name, nameEnd) +
-                                      "' outside a section");
-            return Fail(p_, "expected '{' after section name '" + std::string(name, nameEnd) +
-                                "'");
+                return Fail(name,
+                            Cat("keyword '", std::string_view(name, std::size_t(nameEnd - name)),
+                                "' outside a section"));
+            return Fail(p_, Cat("expected '{' after section name '",
+                                std::string_view(name, std::size_t(nameEnd - name)), "'"));
         } else if (*p_ == '=') {
             ++p_;
             if (!ReadKeyword(name, nameEnd))
                 return false;
         } else {
-            return Fail(p_, "expected '=' after keyword '" + std::string(name, nameEnd) + "'");
+            return Fail(p_, Cat("expected '=' after keyword '",
+                                std::string_view(name, std::size_t(nameEnd - name)), "'"));
         }
     }
     if (open_.size() > 1) {
         const Section& s = d_.sections[open_.back().section];
-        return FailEof("missing '}' for section '" + std::string(s.Name()) +
-                       "' opened at line " + std::to_string(s.Pos().line));
+        return FailEof(Cat("missing '}' for section '", s.Name(), "' opened at line ",
+                           std::to_string(s.Pos().line)));
     }
     CloseSection();
     Trim(d_.keywords);
@@ -258,8 +292,8 @@ bool Reader::Run() {
 
 bool Reader::OpenSection(const char* name, const char* nameEnd) {
     if (open_.size() > kMaxDepth)
-        return Fail(name, "sections nested deeper than " + std::to_string(kMaxDepth) +
-                              " levels");
+        return Fail(name,
+                    Cat("sections nested deeper than ", std::to_string(kMaxDepth), " levels"));
     const auto index = static_cast<std::uint32_t>(d_.sections.size());
     d_.sections.push_back(Access::MakeSection(&doc_, Intern(name, nameEnd), PosOf(name)));
     pending_.push_back(kSectionBit | index);
@@ -279,8 +313,7 @@ void Reader::CloseSection() {
 
 bool Reader::ReadKeyword(const char* name, const char* nameEnd) {
     pending_.push_back(static_cast<std::uint32_t>(d_.keywords.size()));
-    d_.keywords.push_back(Access::MakeKeyword(&doc_, open_.back().section,
-                                              Intern(name, nameEnd),
+    d_.keywords.push_back(Access::MakeKeyword(&doc_, open_.back().section, Intern(name, nameEnd),
                                               static_cast<std::uint32_t>(d_.params.size()),
                                               PosOf(name)));
     SkipBlanks();
@@ -355,13 +388,13 @@ bool Reader::ReadString() {
                 if (e == '\n' || (e == '\0' && p_ + 1 == end_))
                     return Fail(open, "unterminated string");
                 if (static_cast<unsigned char>(e) > 32 && static_cast<unsigned char>(e) < 127)
-                    return Fail(p_, std::string("unknown escape '\\") + e + "' in string");
+                    return Fail(p_, Cat("unknown escape '\\", e, "' in string"));
                 return Fail(p_, "unknown escape in string");
             }
             p_ += 2;
             continue;
         }
-        const char* run = p_++;  // an embedded NUL byte is kept as it is
+        const char* run = p_++; // an embedded NUL byte is kept as it is
         while (!(Cls(*p_) & kStrStop))
             ++p_;
         scratch_.append(run, p_);
@@ -381,7 +414,7 @@ bool Reader::ReadFileName() {
                 ++p_;
             if (*p_ != '\0' || p_ == end_)
                 break;
-            ++p_;  // an embedded NUL byte is kept as it is
+            ++p_; // an embedded NUL byte is kept as it is
         }
         if (*p_ != '\'')
             return Fail(open, "unterminated file name");
@@ -391,13 +424,12 @@ bool Reader::ReadFileName() {
                 Push(Access::Text(ParamType::FileName, d_.text.Store(s), s.size()));
             } else {
                 scratch_.append(run, p_);
-                Push(Access::Text(ParamType::FileName, d_.text.Store(scratch_),
-                                  scratch_.size()));
+                Push(Access::Text(ParamType::FileName, d_.text.Store(scratch_), scratch_.size()));
             }
             ++p_;
             return true;
         }
-        scratch_.append(run, p_ + 1);  // '' stands for one quote
+        scratch_.append(run, p_ + 1); // '' stands for one quote
         p_ += 2;
     }
 }
@@ -416,7 +448,7 @@ bool Reader::ReadWord() {
     else if (word == "inf")
         Push(Access::Double(std::numeric_limits<double>::infinity()));
     else
-        return Fail(w, "unknown value '" + std::string(word) + "' (text needs double quotes)");
+        return Fail(w, Cat("unknown value '", word, "' (text needs double quotes)"));
     return true;
 }
 
@@ -432,9 +464,9 @@ bool Reader::ReadNumber() {
             return true;
         }
     }
-    std::uint64_t m = 0;  // up to 19 significant digits
+    std::uint64_t m = 0; // up to 19 significant digits
     int sig = 0;
-    int exp10 = 0;
+    std::int64_t exp10 = 0;
     int digits = 0;
     bool truncated = false;
     bool real = false;
@@ -476,7 +508,7 @@ bool Reader::ReadNumber() {
         }
     }
     if (digits == 0)
-        return Fail(start, "invalid number '" + Token(start) + "'");
+        return Fail(start, Cat("invalid number '", Token(start), "'"));
     if (*q == 'e' || *q == 'E') {
         real = true;
         ++q;
@@ -484,7 +516,7 @@ bool Reader::ReadNumber() {
         if (*q == '+' || *q == '-')
             ++q;
         if (!(Cls(*q) & kDigit))
-            return Fail(start, "invalid number '" + Token(start) + "'");
+            return Fail(start, Cat("invalid number '", Token(start), "'"));
         int e = 0;
         while (Cls(*q) & kDigit) {
             if (e < 100000)
@@ -494,12 +526,13 @@ bool Reader::ReadNumber() {
         exp10 += eneg ? -e : e;
     }
     if (!(Cls(*q) & kEnd))
-        return Fail(start, "invalid number '" + Token(start) + "'");
+        return Fail(start, Cat("invalid number '", Token(start), "'"));
     p_ = q;
 
     if (!real) {
         if (exp10 > 0 || m > std::uint64_t(INT64_MAX) + (neg ? 1 : 0))
-            return Fail(start, "integer " + std::string(start, q) + " is out of range");
+            return Fail(start, Cat("integer ", std::string_view(start, std::size_t(q - start)),
+                                   " is out of range"));
         Push(Access::Int(neg ? static_cast<std::int64_t>(0 - m) : static_cast<std::int64_t>(m)));
         return true;
     }
@@ -515,25 +548,19 @@ bool Reader::ReadNumber() {
     } else {
         const auto r = std::from_chars(start, q, d);
         if (r.ec == std::errc::result_out_of_range)
-            return Fail(start, "number " + std::string(start, q) + " is out of range");
+            return Fail(start, Cat("number ", std::string_view(start, std::size_t(q - start)),
+                                   " is out of range"));
         if (r.ec != std::errc() || r.ptr != q)
-            return Fail(start, "invalid number '" + Token(start) + "'");
+            return Fail(start, Cat("invalid number '", Token(start), "'"));
     }
     Param p = Access::Double(d);
-    if (MayMisroundAsFloat(d)) {
-        float f;
-        const auto r = std::from_chars(start, q, f);
-        if (r.ec != std::errc()) {
-            const float big = std::fabs(d) > 1 ? std::numeric_limits<float>::infinity() : 0.0f;
-            f = neg ? -big : big;
-        }
-        Access::SetFloat(p, f);
-    }
+    if (MayMisroundAsFloat(d))
+        Access::SetFloat(p, FloatOfText(start, q, d));
     Push(p);
     return true;
 }
 
-}  // namespace
+} // namespace
 
 ParseResult ParseText(std::string text, std::string fileName) {
     ParseResult result;
@@ -584,4 +611,4 @@ ParseResult ParseFile(const std::string& path) {
     return ParseText(std::move(text), path);
 }
 
-}  // namespace paramfile
+} // namespace paramfile

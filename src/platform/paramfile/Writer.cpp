@@ -13,7 +13,7 @@
 namespace paramfile {
 namespace {
 
-constexpr std::size_t kNumberRoom = 34;  // a real, an int64 or a boolean, with ", "
+constexpr std::size_t kNumberRoom = 34; // a real, an int64 or a boolean, with ", "
 
 // Writes through a raw pointer into a string sized ahead, so the hot path has no checks
 // beyond one room test per line.
@@ -125,7 +125,7 @@ char* PutParam(char* o, const Param& p) {
     return o;
 }
 
-}  // namespace
+} // namespace
 
 void WriteText(const Document& doc, std::string& out) {
     const Document::Impl& d = doc.impl();
@@ -230,7 +230,7 @@ bool WriteFileAtomic(const std::string& path, std::string_view text, std::string
     };
     struct stat st {};
     if (::stat(path.c_str(), &st) == 0 && S_ISREG(st.st_mode))
-        ::fchmod(fd, st.st_mode & 07777);  // keep the target's permissions
+        ::fchmod(fd, st.st_mode & 07777); // keep the target's permissions
     const char* p = text.data();
     std::size_t left = text.size();
     while (left > 0) {
@@ -259,4 +259,4 @@ bool WriteFileAtomic(const std::string& path, std::string_view text, std::string
     return true;
 }
 
-}  // namespace paramfile
+} // namespace paramfile
