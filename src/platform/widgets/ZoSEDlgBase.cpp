@@ -1,5 +1,10 @@
 #include "ZoSEDlgBase.h"
 
+#include "ZoNumberEdit.h"
+
+#include <QKeyEvent>
+#include <QKeySequence>
+
 #include <map>
 #include <string>
 
@@ -28,6 +33,16 @@ bool IsDialogClassRegistered(const char* className) {
 
 CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {}
 
+void CZoSEDlgBase::keyPressEvent(QKeyEvent* event) {
+    // F1 reaches the innermost dialog around the focus (a page inside a sheet), never two.
+    if (event->matches(QKeySequence::HelpContents)) {
+        event->accept();
+        ShowHelp();
+        return;
+    }
+    QWidget::keyPressEvent(event);
+}
+
 CZoSEDlgBase::~CZoSEDlgBase() = default;
 
 void CZoSEDlgBase::Attach(CZoSEKivBase* node, CDialogHost* host) {
@@ -37,7 +52,22 @@ void CZoSEDlgBase::Attach(CZoSEKivBase* node, CDialogHost* host) {
 
 void CZoSEDlgBase::Initialize() { SetData(); }
 
-void CZoSEDlgBase::SetData() {}
+void CZoSEDlgBase::SetData() { RefreshFields(); }
+
+void CZoSEDlgBase::RefreshFields() {
+    for (CZoNumberEdit* field : findChildren<CZoNumberEdit*>())
+        if (field->IsBound())
+            field->Refresh();
+}
+
+void CZoSEDlgBase::SelectTreeItem(CZoSEKivBase* node) {
+    if (m_host && node)
+        m_host->SelectTreeItem(node);
+}
+
+CString CZoSEDlgBase::AbsoluteFilePath(const CString& path) const {
+    return m_host ? m_host->AbsoluteFilePath(path) : path;
+}
 
 void CZoSEDlgBase::UpdateDoc(int hint) {
     if (m_node)

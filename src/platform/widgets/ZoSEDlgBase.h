@@ -48,17 +48,28 @@ public:
 
     // One-time set-up; overrides build their controls, then call the base last.
     virtual void Initialize();
-    // Fills the controls from the node and applies the enabling rules.
+    // Fills the controls from the node and applies the enabling rules. The base refreshes
+    // every bound number field (CZoNumberEdit); overrides call it first.
     virtual void SetData();
     // Tells the host that the node changed; the node counts as touched from then on.
+    // The host refreshes the dialog (SetData) before this returns, and must not delete the
+    // dialog inside the call (deleteLater).
     void UpdateDoc(int hint);
-    // The help command: shows the topic of the dialog's help id.
-    void ShowHelp();
+    // The help command (also F1): shows the topic of the dialog's help id.
+    virtual void ShowHelp();
+    // Selects another node in the editor's tree ("Go to..." links).
+    void SelectTreeItem(CZoSEKivBase* node);
+    // A path relative to the setup file made absolute; unchanged without a host.
+    CString AbsoluteFilePath(const CString& path) const;
+    // Shows every bound number field's value again.
+    void RefreshFields();
     // Layout helpers of the framework; Qt layouts do the work.
     void AddAlignRight(QWidget* widget);
     void HideCaption(int hide);
 
 protected:
+    void keyPressEvent(QKeyEvent* event) override;
+
     CZoSEKivBase* m_node = nullptr;
     CDialogHost* m_host = nullptr;
 };
