@@ -14,6 +14,7 @@
 #include "host/ModuleSelection.h"
 #include "hydro/HDSourcesKiv.h"
 #include "setupeditor/NavigationTree.h"
+#include "widgets/ZoPrompts.h"
 
 #include <QAction>
 #include <QApplication>
@@ -229,8 +230,15 @@ void CEditorWindow::BuildActions() {
     view->addAction(m_helpDock->toggleViewAction());
 
     QMenu* help = menuBar()->addMenu(tr("&Help"));
-    QAction* sectionHelp = help->addAction(tr("Help on this &Section"), this,
-                                           [this] { ShowHelp(CurrentHelpId()); });
+    QAction* sectionHelp = help->addAction(tr("Help on this &Section"), this, [this] {
+        // The innermost form around the focus answers (a page inside a sheet), as its own F1.
+        for (QWidget* w = QApplication::focusWidget(); w; w = w->parentWidget())
+            if (auto* form = qobject_cast<CZoSEDlgBase*>(w)) {
+                form->ShowHelp();
+                return;
+            }
+        ShowHelp(CurrentHelpId());
+    });
     sectionHelp->setShortcut(QKeySequence::HelpContents);
     help->addAction(tr("&Using the Editor"), this, [this] { ShowHelp(0); });
 
@@ -710,7 +718,7 @@ void CEditorWindow::OnOpen() {
     if (!MaybeSave())
         return;
     const QString dir = m_path.isEmpty() ? QDir::currentPath() : QFileInfo(m_path).absolutePath();
-    const QString path = QFileDialog::getOpenFileName(this, tr("Open Setup"), dir, tr(kFileFilter));
+    const QString path = ZoGetOpenFileName(this, tr("Open Setup"), dir, tr(kFileFilter));
     if (!path.isEmpty())
         OpenFile(path);
 }

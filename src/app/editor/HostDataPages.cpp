@@ -9,12 +9,12 @@
 #include "hydro/HDDensityKiv.h"
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
+#include "widgets/ZoPrompts.h"
 
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDateTimeEdit>
 #include <QDoubleValidator>
-#include <QFileDialog>
 #include <QFormLayout>
 #include <QGridLayout>
 #include <QGroupBox>
@@ -212,7 +212,8 @@ public:
             }
         });
         connect(browse, &QPushButton::clicked, this, [this] {
-            const QString file = QFileDialog::getOpenFileName(this, tr("Mesh file"), m_file->text());
+            const QString file = ZoGetOpenFileName(this, tr("Mesh file"), m_file->text(),
+                                                   tr("Meshes (*.mesh);;All files (*)"));
             if (file.isEmpty())
                 return;
             m_file->setText(file);

@@ -15,12 +15,14 @@
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
 #include "setupeditor/NavigationTree.h"
+#include "support/UiTestSupport.h"
 
 #include <QApplication>
 #include <QCheckBox>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
+#include <QLineEdit>
 #include <QProcess>
 #include <QPushButton>
 #include <QSpinBox>
@@ -217,6 +219,29 @@ TEST_F(EditorTest, AFieldStillBeingEditedIsStoredBeforeSaving) {
     EXPECT_EQ(m_window->Document().GetPeriod()->TimeStepCount(), 1234);
     EXPECT_TRUE(ReadAll(path).contains("number_of_time_steps = 1234\n"));
     EXPECT_FALSE(m_window->IsModified());
+}
+
+TEST_F(EditorTest, AModelDefinitionEditReshapesTheTreeAndIsSaved) {
+    const QString path = CopyOfExample();
+    ASSERT_TRUE(m_window->OpenFile(path));
+    ASSERT_TRUE(m_window->SelectPath("MUD_TRANSPORT_MODULE/MODEL_DEFINITION"));
+    ASSERT_TRUE(m_window->CurrentDialog());
+    const qsizetype before = TreeTexts().count("Fraction 3");
+    ASSERT_GT(before, 0);
+    EXPECT_EQ(TreeTexts().count("Fraction 4"), 0);
+
+    uitest::Enter(uitest::Child<QLineEdit>(m_window->CurrentDialog(), "fractions"), "4");
+    CParameterSelectionKiv* model = ModelDefinition(m_window->Document().Module());
+    EXPECT_EQ(model->NumberOfFractions(), 4);
+    // Every per-fraction list grew at once, and the tree with them.
+    EXPECT_EQ(TreeTexts().count("Fraction 4"), before);
+    EXPECT_TRUE(m_window->IsModified());
+    EXPECT_EQ(m_window->CurrentNode(), model);
+
+    ASSERT_TRUE(m_window->SaveFile(path));
+    CSetupDocument::OpenResult back = CSetupDocument::Open(path.toStdString());
+    ASSERT_TRUE(back.document);
+    EXPECT_EQ(ModelDefinition(back.document->Module())->NumberOfFractions(), 4);
 }
 
 TEST_F(EditorTest, BoundariesAndSourcesChangedOnTheirPagesAreFollowed) {
