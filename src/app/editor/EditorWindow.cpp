@@ -606,21 +606,37 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     CZoSEDlgBase* dialog = IsHostNode(node)
                                ? CreateHostDataPage(node, *m_doc)
                                : CreateDialogFromClass(node->GetDlgRuntimeClass(kDlgRuntimeClassRequest));
+    // A page with nothing to edit (a group, the module itself) describes its section.
+    auto describe = [&](unsigned long helpId) {
+        const QString text = HelpTopicBodyHtml(helpId);
+        if (text.isEmpty())
+            return;
+        auto* about = new QLabel(text, container);
+        about->setWordWrap(true);
+        about->setMaximumWidth(720);
+        about->setStyleSheet("color: #505050");
+        layout->addWidget(about);
+    };
     if (dialog) {
-        layout->addWidget(dialog, 1);
+        layout->addWidget(dialog);
         m_scroll->setWidget(container);
         m_dialog = dialog;
         dialog->Attach(node, this);
         m_initializing = true;
         dialog->Initialize();
         m_initializing = false;
+        if (dialog->findChildren<QWidget*>().isEmpty())
+            describe(dialog->GetHelpID());
+        else
+            layout->setStretchFactor(dialog, 1);
     } else {
         auto* note = new QLabel(tr("No form for this section yet."), container);
         note->setEnabled(false);
         layout->addWidget(note);
-        layout->addStretch(1);
-        m_scroll->setWidget(container);
+        if (const auto* help = dynamic_cast<const CFemHelpBase*>(node))
+            describe(help->GetHelpID());
     }
+    layout->addStretch(dialog && layout->stretch(layout->indexOf(dialog)) ? 0 : 1);
 }
 
 void CEditorWindow::CommitPendingEdit() {

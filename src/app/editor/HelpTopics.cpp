@@ -185,14 +185,27 @@ const HelpTopic& FindHelpTopic(unsigned long id) {
 
 bool HasHelpTopic(unsigned long id) { return Lookup(id) != nullptr; }
 
+namespace {
+QString Paragraphs(const HelpTopic& t) {
+    QString html;
+    for (const QString& para : QString::fromUtf8(t.text).split(QStringLiteral("\n\n")))
+        html += QStringLiteral("<p>%1</p>").arg(para.toHtmlEscaped());
+    return html;
+}
+}  // namespace
+
+QString HelpTopicBodyHtml(unsigned long id) {
+    const HelpTopic* t = Lookup(id);
+    return t ? Paragraphs(*t) : QString();
+}
+
 QString HelpTopicHtml(unsigned long id) {
     const HelpTopic& t = FindHelpTopic(id);
     QString html = QStringLiteral("<h2>%1</h2>").arg(QString::fromUtf8(t.title).toHtmlEscaped());
     if (id != 0 && !HasHelpTopic(id))
         html += QStringLiteral("<p><i>There is no help topic %1; this is the general help.</i></p>")
                     .arg(id);
-    for (const QString& para : QString::fromUtf8(t.text).split(QStringLiteral("\n\n")))
-        html += QStringLiteral("<p>%1</p>").arg(para.toHtmlEscaped());
+    html += Paragraphs(t);
     if (t.id != 0)
         html += QStringLiteral("<p style='color:gray'>Help topic %1</p>").arg(t.id);
     return html;

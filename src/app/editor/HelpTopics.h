@@ -26,3 +26,5 @@ const HelpTopic& FindHelpTopic(unsigned long id);
 bool HasHelpTopic(unsigned long id);
 // The topic as HTML for the help pane.
 QString HelpTopicHtml(unsigned long id);
+// Only the topic's paragraphs, empty for an unknown id (a description under a page).
+QString HelpTopicBodyHtml(unsigned long id);
