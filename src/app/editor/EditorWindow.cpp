@@ -603,6 +603,7 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     auto* container = new QWidget;
     auto* layout = new QVBoxLayout(container);
     layout->setContentsMargins(16, 12, 16, 12);
+    m_scroll->setWidget(container);
     CZoSEDlgBase* dialog = IsHostNode(node)
                                ? CreateHostDataPage(node, *m_doc)
                                : CreateDialogFromClass(node->GetDlgRuntimeClass(kDlgRuntimeClassRequest));
@@ -619,7 +620,6 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     };
     if (dialog) {
         layout->addWidget(dialog);
-        m_scroll->setWidget(container);
         m_dialog = dialog;
         dialog->Attach(node, this);
         m_initializing = true;

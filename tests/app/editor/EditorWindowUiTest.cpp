@@ -171,6 +171,15 @@ TEST_F(EditorTest, EverySectionOfTheExampleShowsItsForm) {
         const bool hasForm = i >= moduleNodes ||
                              IsDialogClassRegistered(node->GetDlgRuntimeClass(kDlgRuntimeClassRequest));
         EXPECT_EQ(m_window->CurrentDialog() != nullptr, hasForm);
+        if (hasForm) {
+            EXPECT_TRUE(m_window->CurrentDialog()->isVisibleTo(m_window.get()));
+        } else {
+            QLabel* note = nullptr;
+            for (QLabel* l : m_window->findChildren<QLabel*>())
+                if (l->text() == "No form for this section yet." && l->isVisibleTo(m_window.get()))
+                    note = l;
+            EXPECT_TRUE(note);
+        }
     }
     EXPECT_TRUE(m_prompts.empty());
     EXPECT_FALSE(m_window->IsModified());
