@@ -98,7 +98,7 @@ const HelpTopic kTopics[] = {
      "geometry (points, line, area or volume) and the time steps written."},
     {5033, "Outputs",
      "The result files the simulation writes. Add, remove and include outputs here; each "
-     "output has its own specification and items."},
+     "output has its own settings and items."},
     {5034, "Sand Fractions",
      "Mark fractions as sand and give their mean settling velocity."},
     {5035, "Settling of a fraction",
