@@ -93,7 +93,7 @@ const HelpTopic kTopics[] = {
      "Whether and how the bed level follows erosion and deposition during the simulation."},
     {5030, "Output: map", "The geometry of the output on a map."},
     {5031, "Output items", "The quantities that the output writes."},
-    {5032, "Output specification",
+    {5032, "Output definition",
      "The result file of the output, its kind (2D, 3D, mass budget or discharge), its "
      "geometry (points, line, area or volume) and the time steps written."},
     {5033, "Outputs",
