@@ -1,5 +1,6 @@
 #include "DomainKiv.h"
 
+#include "BoundaryNamesKiv.h"
 #include "setupeditor/KivFields.h"
 
 struct DomainFields {
@@ -21,9 +22,23 @@ struct DomainFields {
     };
 };
 
+namespace {
+// LayerTotNum adds the two counts: a count no mesh can have is refused on reading.
+void CheckLayerCount(void* h, const char* keyword, int& value, int before) {
+    if (value >= 0 && value <= CDomainKiv::kMaxLayers)
+        return;
+    kivWarn(h, keyword,
+            FormatString("%s = %d is not a usable number of layers (0 to %d); kept %d", keyword,
+                         value, CDomainKiv::kMaxLayers, before));
+    value = before;
+}
+}  // namespace
+
 CDomainKiv::CDomainKiv(CZoSEKivBase* parent) : CZoSEKivBase("Domain", "DOMAIN", parent) {
     SetDefault();
     GetRoot()->RegisterImportantNode(this, "Domain");
+    m_boundaries = new CBoundaryNamesKiv(this);
+    AddChild(m_boundaries);
 }
 
 CDomainKiv::~CDomainKiv() { GetRoot()->UnregisterImportantNode("Domain"); }
@@ -35,21 +50,71 @@ MeshInfo CDomainKiv::GetMeshInfo() const {
 void CDomainKiv::SetMeshInfo(const MeshInfo& i) {
     m_xMin = i.xMin, m_xMax = i.xMax, m_yMin = i.yMin, m_yMax = i.yMax;
     m_zMin = i.zMin, m_zMax = i.zMax;
+    NotifyListeners(kMeshChanged);
+}
+
+void CDomainKiv::MeshFile(const CString& file) {
+    m_meshFile = file;
+    NotifyListeners(kMeshChanged);
+}
+
+void CDomainKiv::Projection(const CString& p) {
+    m_projection = p;
+    NotifyListeners(kMeshChanged);
+}
+
+void CDomainKiv::ThreeD(bool value) {
+    m_threeDimensional = value;
+    NotifyListeners(kThreeDChanged);
+}
+
+void CDomainKiv::VerticalKind(int kind) {
+    m_verticalKind = kind;
+    NotifyListeners(kLayersChanged);
+}
+
+void CDomainKiv::LayerCount1(int n) {
+    m_layers1 = n;
+    NotifyListeners(kLayersChanged);
+}
+
+void CDomainKiv::LayerCount2(int n) {
+    m_layers2 = n;
+    NotifyListeners(kLayersChanged);
 }
 
 void CDomainKiv::WriteData(void* h) { WriteFields(h, *this, DomainFields::kFields); }
 
 void CDomainKiv::ReadData(void* h) {
+    const int layers1 = m_layers1, layers2 = m_layers2;
     ReadFields(h, *this, DomainFields::kFields);
+    CheckLayerCount(h, "number_of_sigma_layers", m_layers1, layers1);
+    CheckLayerCount(h, "number_of_z_layers", m_layers2, layers2);
     NotifyListeners(kMeshChanged);
+    NotifyListeners(kThreeDChanged);
+    NotifyListeners(kLayersChanged);
 }
 
 int CDomainKiv::ValidateData() {
-    if (m_layers1 < 0 || m_layers2 < 0) {
-        AddError("The number of vertical layers cannot be negative");
-        return 0;
+    int ok = 1;
+    if (m_verticalKind != 1 && m_verticalKind != 2) {
+        AddError(FormatString("Vertical layering %d is not known (1 sigma, 2 sigma and z)",
+                              m_verticalKind));
+        ok = 0;
     }
-    return 1;
+    if (m_layers1 < 0 || m_layers2 < 0 || m_layers1 > kMaxLayers || m_layers2 > kMaxLayers) {
+        AddError(FormatString("The number of vertical layers must be between 0 and %d",
+                              kMaxLayers));
+        ok = 0;
+    } else if (m_threeDimensional && LayerTotNum() < 1) {
+        AddError("A three-dimensional domain needs at least one vertical layer");
+        ok = 0;
+    }
+    if (MeshExist() && (m_xMin > m_xMax || m_yMin > m_yMax || m_zMin > m_zMax)) {
+        AddError("The mesh extent has a minimum above its maximum");
+        ok = 0;
+    }
+    return ok;
 }
 
 void CDomainKiv::SetDefault() { DefaultFields(*this, DomainFields::kFields); }

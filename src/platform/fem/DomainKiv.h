@@ -3,38 +3,51 @@
 #include "FemNotifier.h"
 #include "setupeditor/ZoSEKivBase.h"
 
+class CBoundaryNamesKiv;
+
 struct MeshInfo {
     double xMin = 0, xMax = 0, yMin = 0, yMax = 0, zMin = 0, zMax = 0;
 };
 
-// The model domain ("Domain"): the mesh (present or not, its extent), whether the model is
-// three-dimensional with its vertical layers, and the map projection. Listeners are told
-// when it changes.
+// The model domain ("Domain"): the mesh (present or not, its extent and open boundaries),
+// whether the model is three-dimensional with its vertical layers, and the map projection.
+// Every change through a setter is told to the listeners.
 class CDomainKiv : public CZoSEKivBase, public CFemNotifier {
 public:
-    enum Message { kMeshChanged = 10, kLayersChanged = 11 };
+    enum Message {
+        kThreeDChanged = 3,
+        kMeshChanged = 10,   // mesh file, extent or projection
+        kLayersChanged = 11,  // vertical kind or a layer count
+    };
+    // Layer counts read beyond this are refused (they would only ever be typing errors).
+    static constexpr int kMaxLayers = 1000;
 
     explicit CDomainKiv(CZoSEKivBase* parent);
     ~CDomainKiv() override;
 
     bool MeshExist() const { return !m_meshFile.empty(); }
     const CString& MeshFile() const { return m_meshFile; }
-    void MeshFile(const CString& file) { m_meshFile = file; }
+    void MeshFile(const CString& file);
     MeshInfo GetMeshInfo() const;
     void SetMeshInfo(const MeshInfo& info);
     bool Is3D() const { return m_threeDimensional; }
-    void Is3D(bool value) { m_threeDimensional = value; }
+    void Is3D(bool value) { ThreeD(value); }
+    bool ThreeD() const { return m_threeDimensional; }
+    void ThreeD(bool value);
     // 1: sigma layers only; 2: sigma and z layers.
     int VerticalKind() const { return m_verticalKind; }
-    void VerticalKind(int kind) { m_verticalKind = kind; }
+    void VerticalKind(int kind);
     int LayerCount1() const { return m_layers1; }
-    void LayerCount1(int n) { m_layers1 = n; }
+    void LayerCount1(int n);
     int LayerCount2() const { return m_layers2; }
-    void LayerCount2(int n) { m_layers2 = n; }
+    void LayerCount2(int n);
     // The first count alone for vertical kind 1, else both together.
     int LayerTotNum() const { return m_verticalKind == 1 ? m_layers1 : m_layers1 + m_layers2; }
     const CString& Projection() const { return m_projection; }
-    void Projection(const CString& p) { m_projection = p; }
+    void Projection(const CString& p);
+
+    // The open boundaries of the mesh, registered as "BoundaryNames".
+    CBoundaryNamesKiv* BoundaryNames() const { return m_boundaries; }
 
     void WriteData(void* h) override;
     void ReadData(void* h) override;
@@ -50,6 +63,7 @@ private:
     int m_layers1 = 0;
     int m_layers2 = 0;
     CString m_projection;
+    CBoundaryNamesKiv* m_boundaries = nullptr;
 };
 
 CDomainKiv* Domain(const CZoSEKivBase* node);

@@ -2,9 +2,13 @@
 
 #include "ModuleSelection.h"
 #include "core/MudTransportModuleKiv.h"
+#include "fem/BoundaryNamesKiv.h"
 #include "fem/DomainKiv.h"
 #include "fem/SimulationPeriodKiv.h"
+#include "hydro/HDBoundaryConditionsKiv.h"
 #include "hydro/HDDensityKiv.h"
+#include "hydro/HDSourcesKiv.h"
+#include "hydro/HDWindForcingKiv.h"
 
 #include <set>
 
@@ -14,11 +18,22 @@ CSetupDocument::CSetupDocument() {
     m_domain = AddHostNode(new CDomainKiv(this));
     m_period = AddHostNode(new CSimulationPeriodKiv(this));
     m_density = AddHostNode(new CHDDensityKiv(this));
+    m_sources = AddHostNode(new CHDSourcesKiv(this));
+    m_wind = AddHostNode(new CHDWindForcingKiv(this));
+    // A view of the boundaries with no section of its own; it follows them.
+    m_boundaryConditions = AddHostNode(new CHDBoundaryConditionsKiv(this));
     m_module = new CMudTransportModuleKiv(this);
     AddChild(m_module);
 }
 
 CSetupDocument::~CSetupDocument() = default;
+
+CBoundaryNamesKiv* CSetupDocument::GetBoundaryNames() const { return m_domain->BoundaryNames(); }
+
+void CSetupDocument::SelectTreeItem(CZoSEKivBase* node) {
+    if (m_selector)
+        m_selector(node);
+}
 
 CSetupDocument::OpenResult CSetupDocument::Open(const std::string& path) {
     return FromParsed(paramfile::ParseFile(path), path);

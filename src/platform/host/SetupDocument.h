@@ -5,6 +5,7 @@
 #include "paramfile/ParamFile.h"
 #include "setupeditor/ZoSEKivBase.h"
 
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -15,6 +16,10 @@ class CModuleSelection;
 class CDomainKiv;
 class CSimulationPeriodKiv;
 class CHDDensityKiv;
+class CBoundaryNamesKiv;
+class CHDBoundaryConditionsKiv;
+class CHDSourcesKiv;
+class CHDWindForcingKiv;
 
 class CSetupDocument : public CZoSEKivGlobalBase {
 public:
@@ -44,6 +49,16 @@ public:
     CDomainKiv* GetDomain() const { return m_domain; }
     CSimulationPeriodKiv* GetPeriod() const { return m_period; }
     CHDDensityKiv* GetDensity() const { return m_density; }
+    CBoundaryNamesKiv* GetBoundaryNames() const;
+    CHDBoundaryConditionsKiv* GetBoundaryConditions() const { return m_boundaryConditions; }
+    CHDSourcesKiv* GetSources() const { return m_sources; }
+    CHDWindForcingKiv* GetWind() const { return m_wind; }
+
+    // Where a window shows the tree, nodes ask it to select another node through this.
+    void SetTreeItemSelector(std::function<void(CZoSEKivBase*)> selector) {
+        m_selector = std::move(selector);
+    }
+    void SelectTreeItem(CZoSEKivBase* node) override;
 
 private:
     template <class T>
@@ -61,4 +76,8 @@ private:
     CDomainKiv* m_domain = nullptr;
     CSimulationPeriodKiv* m_period = nullptr;
     CHDDensityKiv* m_density = nullptr;
+    CHDSourcesKiv* m_sources = nullptr;
+    CHDWindForcingKiv* m_wind = nullptr;
+    CHDBoundaryConditionsKiv* m_boundaryConditions = nullptr;
+    std::function<void(CZoSEKivBase*)> m_selector;
 };

@@ -9,8 +9,23 @@ CHDDensityKiv::CHDDensityKiv(CZoSEKivBase* parent)
 
 CHDDensityKiv::~CHDDensityKiv() { GetRoot()->UnregisterImportantNode("HDDensity"); }
 
+const std::vector<CString>& CHDDensityKiv::DensityModeTexts() {
+    static const std::vector<CString> texts = {
+        "Barotropic", "Function of salinity", "Function of temperature",
+        "Function of temperature and salinity"};
+    return texts;
+}
+
 void CHDDensityKiv::WriteData(void* h) { kivPutParam(h, "density_mode", m_mode); }
 void CHDDensityKiv::ReadData(void* h) { kivGetParam(h, "density_mode", &m_mode, 1, 1); }
+
+int CHDDensityKiv::ValidateData() {
+    if (m_mode < 0 || m_mode >= static_cast<int>(DensityModeTexts().size())) {
+        AddError(FormatString("Density mode %d is not known", m_mode));
+        return 0;
+    }
+    return 1;
+}
 
 CHDDensityKiv* HDDensity(const CZoSEKivBase* node) {
     return GetImportant<CHDDensityKiv>(node, "HDDensity");

@@ -2,6 +2,8 @@
 
 #include "setupeditor/ZoSEKivBase.h"
 
+#include <vector>
+
 // The hydrodynamic density mode ("HDDensity"): 0 barotropic; above 0 the density varies
 // (with salinity, temperature or both).
 class CHDDensityKiv : public CZoSEKivBase {
@@ -11,9 +13,12 @@ public:
 
     int DensityMode() const { return m_mode; }
     void DensityMode(int mode) { m_mode = mode; }
+    // Display texts of the density modes, by value.
+    static const std::vector<CString>& DensityModeTexts();
 
     void WriteData(void* h) override;
     void ReadData(void* h) override;
+    int ValidateData() override;
     void SetDefault() override { m_mode = 0; }
 
 private:

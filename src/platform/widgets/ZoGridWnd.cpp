@@ -591,8 +591,10 @@ QSize CZoGridWnd::sizeHint() const {
 }
 
 QSize CZoGridWnd::minimumSizeHint() const {
+    // A short grid keeps all its rows in view (the editor scrolls the dialog instead); a
+    // long one settles for a few rows and scrolls itself.
     const QSize hint = sizeHint();
-    return QSize(std::min(hint.width(), 80), std::min(hint.height(), 60));
+    return QSize(std::min(hint.width(), 480), std::min(hint.height(), 240));
 }
 
 CGridCellStyle CZoGridWnd::CellStyle(int row, int col) {

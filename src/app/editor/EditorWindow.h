@@ -1,0 +1,149 @@
+// The editor's main window: the navigation tree, the form of the selected section, the
+// message list and the help pane, around one setup document.
+#pragma once
+
+#include "host/SetupDocument.h"
+#include "widgets/ZoSEDlgBase.h"
+
+#include <QMainWindow>
+#include <QMessageBox>
+#include <QPointer>
+
+#include <functional>
+#include <memory>
+#include <unordered_set>
+#include <vector>
+
+class QAction;
+class QLabel;
+class QMenu;
+class QScrollArea;
+class QTextBrowser;
+class QToolButton;
+class QTreeWidget;
+class QTreeWidgetItem;
+
+class CEditorWindow : public QMainWindow, public CDialogHost {
+    Q_OBJECT
+public:
+    explicit CEditorWindow(QWidget* parent = nullptr);
+    ~CEditorWindow() override;
+
+    // --- the document ---------------------------------------------------------------
+    CSetupDocument& Document() const { return *m_doc; }
+    bool IsModified() const { return m_modified; }
+    // A new setup with the given numbers of fractions and layers.
+    void NewSetup(int fractions, int layers);
+    // Opens a setup; on an unreadable file or a syntax error the message is shown and the
+    // open document stays as it was. Warnings from reading go to the message list.
+    bool OpenFile(const QString& path);
+    // Validates, then saves atomically; on failure the reason is shown, the file on disk
+    // stays as it was and the document stays modified.
+    bool SaveFile(const QString& path);
+    // Asks what to do with unsaved changes; true when the caller may go on.
+    bool MaybeSave();
+    // Validates the whole setup and fills the message list; true when valid.
+    bool Validate();
+
+    // --- the tree and the pane ------------------------------------------------------
+    // Selects the node with that path (NodePath form, host sections by their names).
+    bool SelectPath(const QString& path);
+    CZoSEKivBase* CurrentNode() const { return m_currentNode; }
+    // The form shown for the current node, null for a placeholder.
+    CZoSEDlgBase* CurrentDialog() const { return m_dialog; }
+    QTreeWidget* Tree() const { return m_tree; }
+    QTreeWidget* Messages() const { return m_messages; }
+    QTextBrowser* HelpView() const { return m_help; }
+    // Every node the tree shows, in tree order (module nodes, then host data).
+    std::vector<CZoSEKivBase*> ShownNodes() const;
+
+    // --- CDialogHost -------------------------------------------------------------------
+    void UpdateDoc(CZoSEDlgBase* dialog, int hint) override;
+    void SelectTreeItem(CZoSEKivBase* node) override;
+    void ShowHelp(unsigned long helpId) override;
+    CString AbsoluteFilePath(const CString& path) override;
+
+    // Questions and messages to the user; tests answer them instead.
+    struct Prompt {
+        QMessageBox::Icon icon;
+        QString title;
+        QString text;
+        QMessageBox::StandardButtons buttons;
+    };
+    using Prompter = std::function<QMessageBox::StandardButton(const Prompt&)>;
+    void SetPrompter(Prompter prompter) { m_prompter = std::move(prompter); }
+
+    // The window's size and docks as the user left them.
+    void RestoreLayout();
+    void SaveLayout();
+    // Recreates the visible form, e.g. after the units changed.
+    void RefreshDialog();
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+
+private:
+    struct ShownEntry {
+        CZoSEKivBase* node;
+        int depth;
+        bool operator==(const ShownEntry&) const = default;
+    };
+
+    void BuildActions();
+    void BuildLayout();
+    void SetDocument(std::unique_ptr<CSetupDocument> doc, const QString& path);
+    void SetModified(bool modified);
+    void UpdateTitle();
+    QMessageBox::StandardButton Ask(const Prompt& prompt);
+
+    std::vector<ShownEntry> CollectModuleEntries() const;
+    void RebuildTree();
+    void RefreshTree();
+    void StyleItem(QTreeWidgetItem* item, CZoSEKivBase* node);
+    QString TitleOf(const CZoSEKivBase* node) const;
+    QTreeWidgetItem* ItemOf(CZoSEKivBase* node) const;
+    std::unordered_set<const CZoSEKivBase*> LiveNodes() const;
+
+    void OnCurrentItemChanged(QTreeWidgetItem* item);
+    void ShowNode(CZoSEKivBase* node);
+    void CloseDialog(bool now);
+    void CommitPendingEdit();
+    unsigned long CurrentHelpId() const;
+    bool IsHostNode(const CZoSEKivBase* node) const;
+    void ShowReadWarnings(const std::vector<paramfile::Diagnostic>& warnings);
+    void OnMessageActivated(QTreeWidgetItem* item);
+
+    void OnNew();
+    void OnOpen();
+    bool OnSave();
+    bool OnSaveAs();
+    void OnPreferences();
+    void AddRecentFile(const QString& path);
+    void UpdateRecentMenu();
+
+    std::unique_ptr<CSetupDocument> m_doc;
+    QString m_path;
+    bool m_modified = false;
+    Prompter m_prompter;
+
+    QTreeWidget* m_tree = nullptr;
+    QTreeWidgetItem* m_moduleItem = nullptr;
+    QTreeWidgetItem* m_hostItem = nullptr;
+    std::vector<ShownEntry> m_entries;
+    std::vector<QTreeWidgetItem*> m_moduleItems;  // parallel to m_entries
+    std::vector<QTreeWidgetItem*> m_hostItems;
+    QLabel* m_paneTitle = nullptr;
+    QLabel* m_panePath = nullptr;
+    QToolButton* m_paneHelp = nullptr;
+    QScrollArea* m_scroll = nullptr;
+    CZoSEKivBase* m_currentNode = nullptr;
+    bool m_initializing = false;
+    QPointer<CZoSEDlgBase> m_dialog;
+    std::vector<QPointer<QWidget>> m_retiring;
+
+    QTreeWidget* m_messages = nullptr;
+    QTextBrowser* m_help = nullptr;
+    class QDockWidget* m_messagesDock = nullptr;
+    class QDockWidget* m_helpDock = nullptr;
+    QMenu* m_recentMenu = nullptr;
+};

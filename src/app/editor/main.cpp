@@ -1,0 +1,127 @@
+// mudsetup-editor: the desktop editor of setups.
+//   mudsetup-editor [FILE]
+//   mudsetup-editor --screenshot OUT.png [--select PATH] FILE
+#include "EditorWindow.h"
+#include "PreferencesDialog.h"
+
+#include <QApplication>
+#include <QStyleFactory>
+#include <QTimer>
+
+#include <cstdio>
+#include <cstring>
+#include <string>
+#include <vector>
+
+namespace {
+
+const char* const kUsage =
+    "usage: mudsetup-editor [FILE]\n"
+    "       mudsetup-editor --screenshot OUT.png [--select PATH] FILE\n"
+    "\n"
+    "Opens FILE (a new setup without one). With --screenshot the window is drawn without a\n"
+    "display, with the node at PATH selected (as 'mudsetup validate' prints paths, e.g.\n"
+    "MUD_TRANSPORT_MODULE/MODEL_DEFINITION or DOMAIN), saved as a PNG, and the editor exits.\n";
+
+struct Options {
+    std::string file;
+    std::string screenshot;
+    std::string select;
+    bool platformGiven = false;
+};
+
+// Reads the editor's own options; Qt's options (-platform ...) are left to Qt.
+bool ParseOptions(int argc, char** argv, Options& o, std::string& error) {
+    for (int i = 1; i < argc; ++i) {
+        const std::string a = argv[i];
+        const bool hasValue = i + 1 < argc;
+        if (a == "--screenshot" && hasValue) {
+            o.screenshot = argv[++i];
+        } else if (a == "--select" && hasValue) {
+            o.select = argv[++i];
+        } else if ((a == "-platform" || a == "--platform") && hasValue) {
+            o.platformGiven = true;
+            ++i;
+        } else if (a == "--screenshot" || a == "--select") {
+            error = a + " needs a value";
+            return false;
+        } else if (!a.empty() && a[0] == '-' && a != "-") {
+            if (a.rfind("-style", 0) == 0 || a.rfind("--style", 0) == 0 || a == "-reverse")
+                continue;  // Qt's own
+            error = "unknown option '" + a + "'";
+            return false;
+        } else if (o.file.empty()) {
+            o.file = a;
+        } else {
+            error = "more than one FILE";
+            return false;
+        }
+    }
+    if (!o.select.empty() && o.screenshot.empty()) {
+        error = "--select goes with --screenshot";
+        return false;
+    }
+    if (!o.screenshot.empty() && o.file.empty()) {
+        error = "--screenshot needs a FILE";
+        return false;
+    }
+    return true;
+}
+
+int TakeScreenshot(CEditorWindow& window, const Options& o) {
+    window.SetPrompter([](const CEditorWindow::Prompt& p) {
+        std::fprintf(stderr, "mudsetup-editor: %s\n", p.text.toStdString().c_str());
+        return QMessageBox::Cancel;
+    });
+    if (!window.OpenFile(QString::fromStdString(o.file)))
+        return 2;
+    if (!o.select.empty() && !window.SelectPath(QString::fromStdString(o.select))) {
+        std::fprintf(stderr, "mudsetup-editor: no section at '%s'\n", o.select.c_str());
+        return 2;
+    }
+    window.resize(1280, 800);
+    window.show();
+    for (int i = 0; i < 5; ++i)
+        QApplication::processEvents();
+    const QImage image = window.grab().toImage();
+    if (!image.save(QString::fromStdString(o.screenshot), "PNG")) {
+        std::fprintf(stderr, "mudsetup-editor: cannot write '%s'\n", o.screenshot.c_str());
+        return 2;
+    }
+    return 0;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    for (int i = 1; i < argc; ++i)
+        if (!std::strcmp(argv[i], "--help") || !std::strcmp(argv[i], "-h")) {
+            std::fputs(kUsage, stdout);
+            return 0;
+        }
+    Options options;
+    std::string error;
+    if (!ParseOptions(argc, argv, options, error)) {
+        std::fprintf(stderr, "mudsetup-editor: %s\n%s", error.c_str(), kUsage);
+        return 2;
+    }
+    // Screenshots need no display unless a platform was chosen.
+    if (!options.screenshot.empty() && !options.platformGiven && qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
+        qputenv("QT_QPA_PLATFORM", "offscreen");
+
+    QApplication app(argc, argv);
+    QApplication::setOrganizationName("mudsetup");
+    QApplication::setApplicationName("mudsetup-editor");
+    if (QStyle* fusion = QStyleFactory::create("Fusion"))
+        QApplication::setStyle(fusion);
+    CPreferencesDialog::LoadRemembered();
+
+    CEditorWindow window;
+    if (!options.screenshot.empty())
+        return TakeScreenshot(window, options);
+    window.RestoreLayout();
+    if (!options.file.empty())
+        window.OpenFile(QString::fromStdString(options.file));
+    window.show();
+    return app.exec();
+}
