@@ -38,6 +38,7 @@ build/release/build.ninja: | deps
 bench: build/release/build.ninja
 	cmake --build --preset release -j $(JOBS)
 	build/release/bench/paramfile_bench
+	build/release/bench/setup_bench
 
 build/fuzz/build.ninja: | deps
 	cmake --preset fuzz

@@ -90,7 +90,8 @@ void CFemInDataKiv::ReadData(void* h) {
 int CFemInDataKiv::ValidateData() {
     if (m_disabled || m_format == 0)
         return 1;
-    const CString what = GetTitle().empty() ? CString("the value") : "'" + GetTitle() + "'";
+    const CString title = GetTitle();
+    const CString what = title.empty() ? CString("the value") : FormatString("'%s'", title.c_str());
     if (m_file.FileName().empty()) {
         AddError("No data file is given for " + what);
         return 0;

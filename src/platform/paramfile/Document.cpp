@@ -414,6 +414,14 @@ const Section* Section::FindSection(std::string_view name, int n) const {
     const std::int64_t id = d.names.Find(name);
     if (id < 0)
         return nullptr;
+    if (entryCount_ >= Document::Impl::kIndexedEntries) {
+        const auto& index = d.IndexOf(*this, static_cast<std::uint32_t>(this - d.sections.data()),
+                                      firstEntry_, entryCount_);
+        auto it = index.sections.find(id);
+        if (it == index.sections.end() || static_cast<size_t>(n) > it->second.size())
+            return nullptr;
+        return &d.sections[it->second[static_cast<size_t>(n) - 1]];
+    }
     const std::uint32_t* e = d.entries.data() + firstEntry_;
     for (std::uint32_t i = 0; i < entryCount_; ++i) {
         if (!(e[i] & kSectionBit))
@@ -432,6 +440,14 @@ const Keyword* Section::FindKeyword(std::string_view name, int n) const {
     const std::int64_t id = d.names.Find(name);
     if (id < 0)
         return nullptr;
+    if (entryCount_ >= Document::Impl::kIndexedEntries) {
+        const auto& index = d.IndexOf(*this, static_cast<std::uint32_t>(this - d.sections.data()),
+                                      firstEntry_, entryCount_);
+        auto it = index.keywords.find(id);
+        if (it == index.keywords.end() || static_cast<size_t>(n) > it->second.size())
+            return nullptr;
+        return &d.keywords[it->second[static_cast<size_t>(n) - 1]];
+    }
     const std::uint32_t* e = d.entries.data() + firstEntry_;
     for (std::uint32_t i = 0; i < entryCount_; ++i) {
         if (e[i] & kSectionBit)
@@ -441,6 +457,28 @@ const Keyword* Section::FindKeyword(std::string_view name, int n) const {
             return &k;
     }
     return nullptr;
+}
+
+const Document::Impl::LookupIndex& Document::Impl::IndexOf(const Section&,
+                                                          std::uint32_t sectionIndex,
+                                                          std::uint32_t firstEntry,
+                                                          std::uint32_t entryCount) const {
+    LookupIndex& index = lookupIndexes[sectionIndex];
+    // A section still being built grows; its index is made again when it has.
+    if (index.firstEntry == firstEntry && index.entryCount == entryCount &&
+        (!index.sections.empty() || !index.keywords.empty()))
+        return index;
+    index = LookupIndex{firstEntry, entryCount, {}, {}};
+    const std::uint32_t* e = entries.data() + firstEntry;
+    for (std::uint32_t i = 0; i < entryCount; ++i) {
+        if (e[i] & kSectionBit) {
+            const std::uint32_t at = e[i] & ~kSectionBit;
+            index.sections[sections[at].name_].push_back(at);
+        } else {
+            index.keywords[keywords[e[i]].name_].push_back(e[i]);
+        }
+    }
+    return index;
 }
 
 std::string Diagnostic::ToString() const {

@@ -10,6 +10,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace paramfile {
@@ -101,6 +102,19 @@ struct Document::Impl {
     Arena text;
     std::size_t sourceBytes = 0; // size of the text read, a hint for the writer
     mutable std::vector<Diagnostic> warnings;
+
+    // Look-ups by name in a section with many entries (a list of thousands of items) go
+    // through an index made on first use, so that reading every item stays linear.
+    struct LookupIndex {
+        std::uint32_t firstEntry = 0;
+        std::uint32_t entryCount = 0;
+        std::unordered_map<std::int64_t, std::vector<std::uint32_t>> sections;  // table indices
+        std::unordered_map<std::int64_t, std::vector<std::uint32_t>> keywords;
+    };
+    mutable std::unordered_map<std::uint32_t, LookupIndex> lookupIndexes;
+    static constexpr std::uint32_t kIndexedEntries = 64;
+    const LookupIndex& IndexOf(const Section& s, std::uint32_t sectionIndex,
+                               std::uint32_t firstEntry, std::uint32_t entryCount) const;
 
     std::size_t MemoryBytes() const;
 };

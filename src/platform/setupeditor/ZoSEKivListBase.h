@@ -40,10 +40,11 @@ public:
         : CZoSEKivListBaseInterface(title, sectionName, parent) {}
 
     ~CZoSEKivAbstractListBase() override {
-        while (!m_items.empty()) {
-            delete m_items.front();
-            m_items.erase(m_items.begin());
-        }
+        // From the head, each item gone from the list before it is deleted.
+        std::vector<T*> items;
+        items.swap(m_items);
+        for (T* item : items)
+            delete item;
         m_synced.clear();
     }
 

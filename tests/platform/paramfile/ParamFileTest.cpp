@@ -734,3 +734,33 @@ TEST(ParamFileProperty, RandomDocumentsRoundTrip) {
 }
 
 } // namespace
+
+// Sections with many entries answer look-ups from an index; the answers must not change.
+TEST(LargeSectionLookup, IndexedLookupsMatchTheOrderOfTheFile) {
+    std::string text = "TOP {\n";
+    for (int i = 1; i <= 300; ++i) {
+        text += "    ITEM_" + std::to_string(i % 100) + " {\n        v = " + std::to_string(i) + "\n    }\n";
+        text += "    k" + std::to_string(i % 7) + " = " + std::to_string(i) + "\n";
+    }
+    text += "}\n";
+    paramfile::ParseResult r = paramfile::ParseText(text, "big");
+    ASSERT_FALSE(r.error);
+    const paramfile::Section* top = r.document->Root().FindSection("TOP");
+    ASSERT_TRUE(top);
+    for (int n = 1; n <= 3; ++n) {
+        const paramfile::Section* s = top->FindSection("ITEM_5", n);
+        ASSERT_TRUE(s) << n;
+        std::int32_t v = 0;
+        ASSERT_TRUE(s->FindKeyword("v")->ParamAt(0).AsInt(v));
+        EXPECT_EQ(v, 5 + 100 * (n - 1));
+    }
+    EXPECT_EQ(top->FindSection("ITEM_5", 4), nullptr);
+    EXPECT_EQ(top->FindSection("ITEM_5", 0), nullptr);
+    EXPECT_EQ(top->FindSection("k3"), nullptr);   // a keyword, not a section
+    EXPECT_EQ(top->FindKeyword("ITEM_3"), nullptr);
+    std::int32_t v = 0;
+    ASSERT_TRUE(top->FindKeyword("k3", 2)->ParamAt(0).AsInt(v));
+    EXPECT_EQ(v, 10);
+    EXPECT_EQ(top->FindKeyword("k3", 44), nullptr);
+    EXPECT_NE(top->FindKeyword("k3", 43), nullptr);
+}
