@@ -52,7 +52,9 @@ fuzz: build/fuzz/build.ninja
 fuzz-ci: build/fuzz/build.ninja
 	cmake --build --preset fuzz -j $(JOBS)
 	mkdir -p build/fuzz/corpus
+	mkdir -p build/fuzz/corpus-setup
 	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus fuzz/corpus
+	build/fuzz/fuzz/setup_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-setup fuzz/corpus-setup
 
 format:
 	git ls-files '*.cpp' '*.h' | xargs clang-format -i
