@@ -154,12 +154,32 @@ TEST_F(ModelDefinitionDialog, SpinButtonsStepWithinTheRange) {
     EXPECT_EQ(fractions->text(), "4");
     EXPECT_EQ(host.hints, (std::vector<int>{2}));
 
+    // A step is a whole value: one layer is stored at once, though "1" could begin "12".
+    model->NumberOfLayers(2);
+    dialog->SetData();
+    host.Clear();
+    QToolButton* down = Child<CZoSpinButton>(dialog.get(), "layersSpin")->DownButton();
+    QTest::mouseClick(down, Qt::LeftButton);
+    EXPECT_EQ(model->NumberOfLayers(), 1);
+    EXPECT_EQ(layers->GetItemCount(), 1);
+    EXPECT_EQ(host.hints, (std::vector<int>{4}));
+
+    host.Clear();
+    QTest::mouseClick(down, Qt::LeftButton);
+    EXPECT_EQ(model->NumberOfLayers(), 1);
+    EXPECT_TRUE(host.hints.empty());
+}
+
+TEST_F(ModelDefinitionDialog, RetypingACountThatWaitsForDigitsStillReachesTheSetter) {
     model->NumberOfLayers(1);
     dialog->SetData();
     host.Clear();
-    QTest::mouseClick(Child<CZoSpinButton>(dialog.get(), "layersSpin")->DownButton(), Qt::LeftButton);
+    Enter(layersField, "1");
     EXPECT_EQ(model->NumberOfLayers(), 1);
-    EXPECT_TRUE(host.hints.empty());
+    EXPECT_EQ(host.hints, (std::vector<int>{1}));
+    // Leaving it again without typing stores nothing more.
+    QTest::keyClick(layersField, Qt::Key_Return);
+    EXPECT_EQ(host.hints, (std::vector<int>{1}));
 }
 
 TEST(CoreDialogs, RootAndGroupPagesCarryTheirHelpTopics) {

@@ -69,6 +69,7 @@ void CZoNumberEdit::BindInt(CZoSEDlgBase* dialog, int& value) {
 
 void CZoNumberEdit::ShowText(const QString& text) {
     m_shownText = text;
+    m_waiting = false;
     if (QLineEdit::text() != text)
         setText(text);
 }
@@ -100,7 +101,8 @@ void CZoNumberEdit::StepBy(int delta) {
     if (next == current && text() == m_shownText)
         return;
     setText(m_style.Format(next, m_kind));
-    Commit(!m_storeOnChange);
+    // A step gives a whole value: nothing more will be typed after it.
+    Commit(true);
 }
 
 void CZoNumberEdit::Commit(bool finished) {
@@ -109,8 +111,8 @@ void CZoNumberEdit::Commit(bool finished) {
     const QString typed = text();
     if (finished) {
         // Leaving a field without typing stores nothing: a rounded display must not
-        // overwrite the value it shows.
-        if (typed == m_shownText)
+        // overwrite the value it shows. A count that waited for more digits was typed.
+        if (typed == m_shownText && !m_waiting)
             return;
     } else {
         const QString t = typed.trimmed();
@@ -130,8 +132,11 @@ void CZoNumberEdit::Commit(bool finished) {
     // for the field to be left: "1" on the way to "12" must not first cut the lists to one
     // item and lose the items' values.
     if (!finished && m_kind == ZoNumberKind::Int && m_style.HasMaximum() && value > 0 &&
-        value * 10 <= m_style.Maximum())
+        value * 10 <= m_style.Maximum()) {
+        m_waiting = true;
         return;
+    }
+    m_waiting = false;
     QPointer<CZoNumberEdit> self(this);
     QPointer<CZoSEDlgBase> dialog(m_dialog);
     m_busy = true;

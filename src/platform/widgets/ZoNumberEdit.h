@@ -71,6 +71,7 @@ private:
     std::function<void(double)> m_set;
     bool m_storeOnChange = false;
     bool m_busy = false;
+    bool m_waiting = false;  // a typed count waits for more digits or for the field to be left
     QString m_shownText;
 };
 
