@@ -1,6 +1,7 @@
 // Change notification between nodes that do not own each other.
 #pragma once
 
+#include <list>
 #include <vector>
 
 using ENotifyMessage = int;
@@ -19,7 +20,14 @@ public:
 
 private:
     friend class CFemListener;
-    std::vector<CFemListener*> m_listeners;
+    // One entry per listener, so that leaving costs the same however many listen (one per
+    // boundary or source); an entry left while listeners are told is emptied, not erased.
+    using Listeners = std::list<CFemListener*>;
+    void Remove(Listeners::iterator at);
+
+    Listeners m_listeners;
+    int m_notifying = 0;
+    bool m_emptied = false;
 };
 
 class CFemListener {
@@ -35,5 +43,9 @@ public:
 
 private:
     friend class CFemNotifier;
-    std::vector<CFemNotifier*> m_notifiers;
+    struct Subscription {
+        CFemNotifier* notifier;
+        CFemNotifier::Listeners::iterator at;
+    };
+    std::vector<Subscription> m_notifiers;
 };

@@ -128,7 +128,7 @@ CZoUnitConverter::CZoUnitConverter(int from, int to) {
     const QuantityInfo* qTo = nullptr;
     const UnitInfo* uFrom = FindUnit(from, &qFrom);
     const UnitInfo* uTo = FindUnit(to, &qTo);
-    if (!uFrom || !uTo || from == to)
+    if (!uFrom || !uTo || from == to || qFrom != qTo)
         return;
     m_factor = uFrom->toBase / uTo->toBase;
 }
