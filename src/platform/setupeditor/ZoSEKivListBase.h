@@ -60,12 +60,14 @@ public:
             delete m_items.back();
             m_items.pop_back();
         }
+        const bool grows = m_items.size() < target;
         while (m_items.size() < target) {
             m_items.push_back(Create());
             m_items.back()->m_positionHint = static_cast<int>(m_items.size());
-            if (GetHasBeenTouched())
-                m_items.back()->TouchAllChildren();
         }
+        // The new items count as edited like the rest; once for all of them keeps it linear.
+        if (grows && GetHasBeenTouched())
+            TouchAllChildren();
         for (const NodeInListOfSyncedLists& r : SyncedCopy())
             r.list->SetItemCount(count, r.level);
     }
@@ -96,7 +98,7 @@ public:
             m_items.insert(m_items.begin() + (index - 1), item);
             m_numberingDirty = true;
             if (GetHasBeenTouched())
-                item->TouchAllChildren();
+                TouchAllChildren();
         }
         for (const NodeInListOfSyncedLists& r : SyncedCopy())
             r.list->Insert(index, r.level);

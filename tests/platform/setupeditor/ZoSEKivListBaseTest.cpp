@@ -107,10 +107,14 @@ TEST_F(ListTest, InsertDeleteAndMovesKeepValuesAndRenumber) {
 }
 
 TEST_F(ListTest, TouchedListMarksNewItemsTouchedAndReInitializeRespectsIt) {
-    list->TouchAllChildren();
+    // A dialog's edit touches the list alone; growing it touches all it holds.
+    list->SetHasBeenTouched(true);
+    list->SetItemCount(5, 1);
+    EXPECT_FALSE(list->GetItem(2)->GetHasBeenTouched());
     list->SetItemCount(6, 1);
     list->Insert(1, 1);
     EXPECT_TRUE(list->GetItem(1)->GetHasBeenTouched());
+    EXPECT_TRUE(list->GetItem(3)->GetHasBeenTouched());
     EXPECT_TRUE(list->GetItem(7)->GetHasBeenTouched());
 
     list->ReInitialize(1, false);
