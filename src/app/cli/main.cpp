@@ -84,11 +84,20 @@ std::unique_ptr<CSetupDocument> OpenOrReport(const std::string& path) {
     return std::move(opened.document);
 }
 
+// False, with a message, when standard output could not take everything (a full disk).
+bool FlushStdout() {
+    std::cout.flush();
+    if (std::cout && std::fflush(stdout) == 0 && !std::ferror(stdout))
+        return true;
+    std::cerr << "mudsetup: cannot write to standard output\n";
+    return false;
+}
+
 bool WriteOut(CSetupDocument& doc, const std::string& output) {
     if (output == "-") {
         const std::string text = doc.ToText();
         std::fwrite(text.data(), 1, text.size(), stdout);
-        return std::fflush(stdout) == 0;
+        return FlushStdout();
     }
     std::string error;
     if (!doc.SaveAs(output, &error)) {
@@ -150,6 +159,8 @@ int CmdValidate(const std::vector<std::string>& args) {
     const int ok = doc->ValidateAll();
     for (const CZoSEKivGlobalBase::ErrorEntry& e : doc->Errors())
         std::cout << NodePath(e.node) << ": " << e.message << "\n";
+    if (!FlushStdout())
+        return kExitError;
     return ok && doc->Errors().empty() ? kExitOk : kExitInvalid;
 }
 
@@ -193,7 +204,7 @@ int CmdShow(const std::vector<std::string>& args) {
             std::cout << " (not used)";
         std::cout << "\n";
     });
-    return kExitOk;
+    return FlushStdout() ? kExitOk : kExitError;
 }
 
 }  // namespace

@@ -124,6 +124,21 @@ TEST_F(Cli, ShowPrintsTheTreeIndented) {
         << r.out;
 }
 
+TEST_F(Cli, OutputThatCannotBeWrittenIsAFailure) {
+    if (!fs::exists("/dev/full"))
+        GTEST_SKIP() << "no /dev/full";
+    ASSERT_EQ(Mudsetup("new -o " + P("a.setup")).exitCode, 0);
+    WriteFile(dir / "bad.setup",
+              "MUD_TRANSPORT_MODULE {\n mode = 2\n MODEL_DEFINITION {\n  number_of_fractions = 9\n }\n}\n");
+    for (const std::string& args : {std::string("new"), "show " + P("a.setup"),
+                                   "format " + P("a.setup") + " -o -", "validate " + P("bad.setup")}) {
+        const std::string cmd = std::string(MUDSETUP_EXE) + " " + args + " >/dev/full 2>/dev/null";
+        const int status = std::system(cmd.c_str());
+        ASSERT_TRUE(WIFEXITED(status)) << args;
+        EXPECT_EQ(WEXITSTATUS(status), 2) << args;
+    }
+}
+
 TEST_F(Cli, HelpAndBadArguments) {
     for (const char* command : {"--help", "new --help", "validate --help", "format --help", "show --help"}) {
         Result r = Mudsetup(command);
