@@ -182,6 +182,18 @@ TEST_F(ModelDefinitionDialog, RetypingACountThatWaitsForDigitsStillReachesTheSet
     EXPECT_EQ(host.hints, (std::vector<int>{1}));
 }
 
+TEST_F(ModelDefinitionDialog, ADialogDeletedWhileACountIsTypedDoesNotReachBackIntoIt) {
+    dialog->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(dialog.get()));
+    layersField->setFocus();
+    Type(layersField, "1");  // waits for more digits, then the window goes
+    ASSERT_TRUE(layersField->hasFocus());
+    dialog.reset();
+    EXPECT_EQ(model->NumberOfLayers(), 4);
+    EXPECT_EQ(layers->GetItemCount(), 4);
+    EXPECT_TRUE(host.hints.empty());
+}
+
 TEST(CoreDialogs, RootAndGroupPagesCarryTheirHelpTopics) {
     CSetupDocument doc;
     CRecordingHost host;
@@ -275,3 +287,4 @@ TEST_F(SolutionTechniqueDialog, UnknownSchemesShowNoEntryAndStayAsRead) {
 }
 
 }  // namespace
+

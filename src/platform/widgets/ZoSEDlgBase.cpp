@@ -2,8 +2,10 @@
 
 #include "ZoNumberEdit.h"
 
+#include <QAbstractItemDelegate>
 #include <QKeyEvent>
 #include <QKeySequence>
+#include <QLineEdit>
 
 #include <map>
 #include <string>
@@ -43,7 +45,14 @@ void CZoSEDlgBase::keyPressEvent(QKeyEvent* event) {
     QWidget::keyPressEvent(event);
 }
 
-CZoSEDlgBase::~CZoSEDlgBase() = default;
+CZoSEDlgBase::~CZoSEDlgBase() {
+    // A visible window closes, and a field being edited loses the focus, only after this:
+    // what the field would store then must not reach back into a dialog that is gone.
+    for (QLineEdit* edit : findChildren<QLineEdit*>())
+        QObject::disconnect(edit, &QLineEdit::editingFinished, nullptr, nullptr);
+    for (QAbstractItemDelegate* delegate : findChildren<QAbstractItemDelegate*>())
+        QObject::disconnect(delegate, &QAbstractItemDelegate::commitData, nullptr, nullptr);
+}
 
 void CZoSEDlgBase::Attach(CZoSEKivBase* node, CDialogHost* host) {
     m_node = node;

@@ -326,4 +326,26 @@ TEST(PropertySheet, PagesByClassNameReportThroughTheSheetAndOpenOnTheInitialPage
     EXPECT_EQ(host.helpIds, (std::vector<unsigned long>{6001, 6000}));
 }
 
+TEST(PropertySheet, ASheetDeletedWhileAPageFieldIsEditedDoesNotReachBackIntoIt) {
+    CZoSEKivGlobalBase root;
+    auto* node = new PageNode("First", "FIRST", &root);
+    root.AddChild(node);
+    const double before = node->value;
+    CRecordingHost host;
+    auto sheet = std::make_unique<CFemPropertySheetDlg>();
+    sheet->Attach(node, &host);
+    ASSERT_TRUE(sheet->AddPage("CTestPageDlg"));
+    sheet->Initialize();
+    sheet->show();
+    sheet->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(sheet.get()));
+    auto* page = static_cast<CTestPageDlg*>(sheet->GetPage(0));
+    page->field->setFocus();
+    Type(page->field, "7");
+    ASSERT_TRUE(page->field->hasFocus());
+    sheet.reset();  // the window closes as it goes, and the field loses the focus
+    EXPECT_EQ(node->value, before);
+    EXPECT_TRUE(host.hints.empty());
+}
+
 }  // namespace
