@@ -56,9 +56,11 @@ public:
             return;
         }
         const size_t target = static_cast<size_t>(std::max(count, 0));
+        // Each item leaves the list before it is deleted.
         while (m_items.size() > target) {
-            delete m_items.back();
+            T* last = m_items.back();
             m_items.pop_back();
+            delete last;
         }
         const bool grows = m_items.size() < target;
         while (m_items.size() < target) {
@@ -78,9 +80,10 @@ public:
             return;
         }
         if (index >= 1 && index <= static_cast<int>(m_items.size())) {
-            delete m_items[index - 1];
+            T* item = m_items[index - 1];
             m_items.erase(m_items.begin() + (index - 1));
             m_numberingDirty = true;
+            delete item;
         }
         for (const NodeInListOfSyncedLists& r : SyncedCopy())
             r.list->Delete(index, r.level);

@@ -106,6 +106,28 @@ TEST_F(ListTest, InsertDeleteAndMovesKeepValuesAndRenumber) {
     EXPECT_EQ(recorder.calls.back(), "count 6@3");
 }
 
+// An item that looks at its list as it goes.
+class WatchingItem : public CZoSEKivBase {
+public:
+    explicit WatchingItem(CZoSEKivBase* parent) : CZoSEKivBase("Item %d", "ITEM_%d", parent) {}
+    ~WatchingItem() override {
+        auto* list = static_cast<CZoSEKivListBaseInterface*>(GetParent());
+        seen.push_back(std::to_string(list->GetItemCount()) + "/" + std::to_string(GetNumberWhatAmI()));
+    }
+    static inline std::vector<std::string> seen;
+};
+
+TEST(ListItems, LeaveTheListBeforeTheyAreDeleted) {
+    CZoSEKivGlobalBase root;
+    auto* list = new CZoSEKivListBase<WatchingItem>("Items", "ITEMS", &root);
+    root.AddChild(list);
+    list->SetItemCount(4, 1);
+    WatchingItem::seen.clear();
+    list->Delete(2, 1);
+    list->SetItemCount(2, 1);
+    EXPECT_EQ(WatchingItem::seen, (std::vector<std::string>{"3/-1", "2/-1"}));
+}
+
 TEST_F(ListTest, TouchedListMarksNewItemsTouchedAndReInitializeRespectsIt) {
     // A dialog's edit touches the list alone; growing it touches all it holds.
     list->SetHasBeenTouched(true);
