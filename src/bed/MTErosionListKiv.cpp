@@ -5,8 +5,8 @@
 struct ErosionListFields {
     using F = KivField<CMTErosionListKiv>;
     static inline const F kFields[] = {
-        F::Double("max_concentration_due_to_erosion", &CMTErosionListKiv::m_maxConcentration,
-                  50.0),
+        F::DoubleAsFloat("max_concentration_due_to_erosion",
+                         &CMTErosionListKiv::m_maxConcentration, 50.0),
     };
 };
 

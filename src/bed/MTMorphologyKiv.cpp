@@ -8,7 +8,7 @@ struct MorphologyFields {
     static inline const F kFields[] = {
         F::Bool("include_morphological_update", &K::m_includeUpdate, false),
         F::Bool("include_speedup", &K::m_includeSpeedup, false),
-        F::Double("speedup_factor", &K::m_speedupFactor, 1.0),
+        F::DoubleAsFloat("speedup_factor", &K::m_speedupFactor, 1.0),
     };
 };
 

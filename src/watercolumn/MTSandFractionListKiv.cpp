@@ -68,9 +68,10 @@ void CMTSandFractionListKiv::WriteData(void* h) {
 
 void CMTSandFractionListKiv::ReadData(void* h) {
     ReadFields(h, *this, SandFractionListFields::kFields);
-    int raw = m_includeSandFractions ? 1 : 0;
-    kivGetParam(h, "sand_fraction_description", &raw, 1, 1);
-    WarnUnknownFlag(h, "sand_fraction_description", raw);
+    // Looked at, not read again: a value of the wrong type is reported once, by the read.
+    if (void* k = kivKeywordByNameNum(h, "sand_fraction_description", 1))
+        if (void* p = kivParamByNum(k, 1))
+            WarnUnknownFlag(h, "sand_fraction_description", kivGetInt(p));
 }
 
 const char* CMTSandFractionListKiv::GetDlgRuntimeClass(unsigned code) {

@@ -155,9 +155,9 @@ void CMTSettlingDlg::Store() {
         s->HinderedSettling(0);
     else if (m_richardsonZaki->isChecked())
         s->HinderedSettling(2);
-    else if (m_winterwerp->isChecked())
+    else if (m_winterwerp->isChecked() || s->HinderedSettling() < 1)
         s->HinderedSettling(1);
-    // else: a value no formulation stands for, kept as read
+    // else: a value above 2 that no formulation stands for, kept as read
     // The items' values in use follow the choice at once, not only at the next validation,
     // so that the item dialogs and the tree show the value the choice needs as in use.
     for (int i = 1; i <= s->GetItemCount(); ++i)

@@ -226,6 +226,12 @@ TEST(MTErosionListKiv, EveryEditedValueSurvivesSaveAndLoad) {
 
     CMTErosionListKiv* read = Erosion(*again);
     EXPECT_EQ(read->MaxConcentration(), 12.25);
+    // The limit is written as a float.
+    list->MaxConcentration(1.0 / 3.0);
+    auto saved = Saved(*doc);
+    const paramfile::Section* erosion = Find(*saved, {"MUD_TRANSPORT_MODULE", "BED", "EROSION"});
+    ASSERT_NE(erosion, nullptr);
+    EXPECT_EQ(Double(*erosion, "max_concentration_due_to_erosion"), 0.33333334);
     EXPECT_FALSE(read->GetItem(1)->SoftMud());
     EXPECT_EQ(read->GetItem(1)->PowerOfErosion(), 2.5);
     EXPECT_TRUE(read->GetItem(2)->SoftMud());

@@ -83,3 +83,13 @@ TEST(MTMorphologyKiv, AnyFactorIsAcceptedAndKept) {
         EXPECT_TRUE(Morphology(*again)->IncludeMorphologicalUpdate());
     }
 }
+
+TEST(MTMorphologyKiv, FactorIsWrittenAsAFloat) {
+    CSetupDocument doc;
+    Morphology(doc)->SpeedupFactor(1.0 / 3.0);
+    auto saved = Saved(doc);
+    const paramfile::Section* s = Find(*saved, {"MUD_TRANSPORT_MODULE", "MORPHOLOGY"});
+    ASSERT_NE(s, nullptr);
+    EXPECT_EQ(Double(*s, "speedup_factor"), 0.33333334);
+    EXPECT_EQ(Morphology(doc)->SpeedupFactor(), 1.0 / 3.0);  // the model is not narrowed
+}

@@ -93,6 +93,15 @@ TEST(SandFractions, SwitchOtherThanOneReadsAsOffWithAWarning) {
 
     auto missing = Load(Module(1, " WATER_COLUMN {\n  SAND_FRACTIONS {\n  }\n }\n"));
     EXPECT_FALSE(Sand(*missing)->IncludeSandFractions());
+
+    // A switch of the wrong type keeps the default and is reported once.
+    auto typed = CSetupDocument::FromText(
+        Module(1, " WATER_COLUMN {\n  SAND_FRACTIONS {\n   sand_fraction_description = true\n"
+                  "  }\n }\n"),
+        "t.setup");
+    ASSERT_TRUE(typed.document);
+    EXPECT_FALSE(Sand(*typed.document)->IncludeSandFractions());
+    EXPECT_EQ(WarningTexts(typed).size(), 1u);
 }
 
 TEST(SandFractions, ResizingKeepsTheRemainingItems) {

@@ -224,6 +224,15 @@ TEST_F(DialogTest, SettlingHinderedChoiceIsStoredAsNoneWinterwerpOrRichardsonZak
     Click(d, "includeFlocculation");
     EXPECT_EQ(settling->Flocculation(), 1);
     EXPECT_EQ(settling->HinderedSettling(), 3);
+
+    // Below 0 the box shows unchecked: ticking it includes hindered settling.
+    settling->HinderedSettling(-1);
+    dlg->SetData();
+    EXPECT_FALSE(Checked(d, "includeHinderedSettling"));
+    Click(d, "includeHinderedSettling");
+    EXPECT_EQ(settling->HinderedSettling(), 1);
+    EXPECT_TRUE(Checked(d, "includeHinderedSettling"));
+    EXPECT_TRUE(Checked(d, "winterwerp"));
 }
 
 TEST_F(DialogTest, SettlingConcentrationsAreEnteredInTheUsersUnit) {

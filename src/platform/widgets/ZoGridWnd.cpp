@@ -253,6 +253,15 @@ QRect FileButtonRect(const QRect& cell) {
     return QRect(cell.right() - w + 1, cell.top(), w, cell.height());
 }
 
+// The cell's palette for a control drawn in it: a disabled control takes the disabled
+// colours, or its label stays black and it looks clickable.
+QPalette ControlPalette(const QStyleOptionViewItem& opt, bool enabled) {
+    QPalette palette = opt.palette;
+    if (!enabled)
+        palette.setCurrentColorGroup(QPalette::Disabled);
+    return palette;
+}
+
 class CZoGridDelegate : public QStyledItemDelegate {
 public:
     explicit CZoGridDelegate(CZoGridWnd* grid) : QStyledItemDelegate(grid), m_grid(grid) {}
@@ -274,6 +283,7 @@ public:
             box.rect = QRect(opt.rect.center() - QPoint(w / 2, h / 2), QSize(w, h));
             box.state = (style.checked ? QStyle::State_On : QStyle::State_Off) |
                         (enabled ? QStyle::State_Enabled : QStyle::State_None);
+            box.palette = ControlPalette(opt, enabled);
             qs->drawPrimitive(QStyle::PE_IndicatorCheckBox, &box, painter, m_grid);
             return;
         }
@@ -285,6 +295,8 @@ public:
             button.text = QString::fromStdString(style.text);
             button.state = QStyle::State_Raised |
                            (enabled ? QStyle::State_Enabled : QStyle::State_None);
+            button.palette = ControlPalette(opt, enabled);
+            button.fontMetrics = opt.fontMetrics;
             qs->drawControl(QStyle::CE_PushButton, &button, painter, m_grid);
             return;
         }
@@ -298,6 +310,8 @@ public:
             button.text = "...";
             button.state = QStyle::State_Raised |
                            (enabled ? QStyle::State_Enabled : QStyle::State_None);
+            button.palette = ControlPalette(opt, enabled);
+            button.fontMetrics = opt.fontMetrics;
             qs->drawControl(QStyle::CE_PushButton, &button, painter, m_grid);
             return;
         }

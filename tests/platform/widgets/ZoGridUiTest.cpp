@@ -13,6 +13,8 @@
 #include <QTest>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 #include <gtest/gtest.h>
 
 using namespace uitest;
@@ -50,7 +52,7 @@ protected:
                 .SetReadOnly(!item->on);
             break;
         case 4: s.SetFileName(item->file, "Time series (*.qrd0)"); break;
-        case 5: s.SetButton(kGoToLabel); break;
+        case 5: s.SetButton(kGoToLabel).SetReadOnly(!item->on); break;
         }
     }
     int StoreItem(Row* item, int, int col, const CGridCellValue& v) override {
@@ -358,6 +360,30 @@ TEST_F(Grid, ChoicesAndFileNamesAreStoredAsSoonAsTheyAreMade) {
     Enter(line, "local.qrd0");
     QApplication::processEvents();
     EXPECT_EQ(list->GetItem(2)->file, "local.qrd0");
+}
+
+TEST_F(Grid, GreyedLinksAreDrawnInTheDisabledColours) {
+    Open(false, 2);
+    list->GetItem(2)->on = false;
+    grid->Redraw();
+    // The darkest pixel of a cell: the label of the button in it.
+    auto darkest = [&](int row, int col) {
+        const QImage image = grid->viewport()->grab(grid->CellRect(row, col)).toImage();
+        int dark = 255;
+        for (int y = 0; y < image.height(); ++y)
+            for (int x = 0; x < image.width(); ++x)
+                dark = std::min(dark, qGray(image.pixel(x, y)));
+        return dark;
+    };
+    auto grey = [&](QPalette::ColorGroup group) {
+        return qGray(grid->palette().color(group, QPalette::ButtonText).rgb());
+    };
+    EXPECT_LE(darkest(1, 5), grey(QPalette::Active) + 40);
+    EXPECT_GE(darkest(2, 5), grey(QPalette::Disabled) - 40);
+    // A greyed link does nothing.
+    ClickCell(2, 5);
+    ClickCell(1, 5);
+    EXPECT_EQ(host.selected, (std::vector<CZoSEKivBase*>{list->GetItem(1)}));
 }
 
 TEST(GridFit, ScrollBarsOnlyWhereTheContentDoesNotFit) {
