@@ -408,59 +408,24 @@ const Section& Section::SectionAt(int index) const {
 }
 
 const Section* Section::FindSection(std::string_view name, int n) const {
-    if (!doc_ || n < 1)
+    if (!doc_)
         return nullptr;
     const Document::Impl& d = doc_->impl();
-    const std::int64_t id = d.names.Find(name);
-    if (id < 0)
-        return nullptr;
-    if (entryCount_ >= Document::Impl::kIndexedEntries) {
-        const auto& index = d.IndexOf(*this, static_cast<std::uint32_t>(this - d.sections.data()),
-                                      firstEntry_, entryCount_);
-        auto it = index.sections.find(id);
-        if (it == index.sections.end() || static_cast<size_t>(n) > it->second.size())
-            return nullptr;
-        return &d.sections[it->second[static_cast<size_t>(n) - 1]];
-    }
-    const std::uint32_t* e = d.entries.data() + firstEntry_;
-    for (std::uint32_t i = 0; i < entryCount_; ++i) {
-        if (!(e[i] & kSectionBit))
-            continue;
-        const Section& s = d.sections[e[i] & ~kSectionBit];
-        if (s.name_ == id && --n == 0)
-            return &s;
-    }
-    return nullptr;
+    const std::int64_t at = d.FindEntry(static_cast<std::uint32_t>(this - d.sections.data()),
+                                        firstEntry_, entryCount_, name, n, true);
+    return at < 0 ? nullptr : &d.sections[static_cast<size_t>(at)];
 }
 
 const Keyword* Section::FindKeyword(std::string_view name, int n) const {
-    if (!doc_ || n < 1)
+    if (!doc_)
         return nullptr;
     const Document::Impl& d = doc_->impl();
-    const std::int64_t id = d.names.Find(name);
-    if (id < 0)
-        return nullptr;
-    if (entryCount_ >= Document::Impl::kIndexedEntries) {
-        const auto& index = d.IndexOf(*this, static_cast<std::uint32_t>(this - d.sections.data()),
-                                      firstEntry_, entryCount_);
-        auto it = index.keywords.find(id);
-        if (it == index.keywords.end() || static_cast<size_t>(n) > it->second.size())
-            return nullptr;
-        return &d.keywords[it->second[static_cast<size_t>(n) - 1]];
-    }
-    const std::uint32_t* e = d.entries.data() + firstEntry_;
-    for (std::uint32_t i = 0; i < entryCount_; ++i) {
-        if (e[i] & kSectionBit)
-            continue;
-        const Keyword& k = d.keywords[e[i]];
-        if (k.name_ == id && --n == 0)
-            return &k;
-    }
-    return nullptr;
+    const std::int64_t at = d.FindEntry(static_cast<std::uint32_t>(this - d.sections.data()),
+                                        firstEntry_, entryCount_, name, n, false);
+    return at < 0 ? nullptr : &d.keywords[static_cast<size_t>(at)];
 }
 
-const Document::Impl::LookupIndex& Document::Impl::IndexOf(const Section&,
-                                                          std::uint32_t sectionIndex,
+const Document::Impl::LookupIndex& Document::Impl::IndexOf(std::uint32_t sectionIndex,
                                                           std::uint32_t firstEntry,
                                                           std::uint32_t entryCount) const {
     LookupIndex& index = lookupIndexes[sectionIndex];
@@ -479,6 +444,35 @@ const Document::Impl::LookupIndex& Document::Impl::IndexOf(const Section&,
         }
     }
     return index;
+}
+
+std::int64_t Document::Impl::FindEntry(std::uint32_t sectionIndex, std::uint32_t firstEntry,
+                                       std::uint32_t entryCount, std::string_view name, int n,
+                                       bool wantSection) const {
+    if (n < 1)
+        return -1;
+    const std::int64_t id = names.Find(name);
+    if (id < 0)
+        return -1;
+    if (entryCount >= kIndexedEntries) {
+        const LookupIndex& index = IndexOf(sectionIndex, firstEntry, entryCount);
+        const auto& byName = wantSection ? index.sections : index.keywords;
+        auto it = byName.find(id);
+        if (it == byName.end() || static_cast<size_t>(n) > it->second.size())
+            return -1;
+        return it->second[static_cast<size_t>(n) - 1];
+    }
+    const std::uint32_t* e = entries.data() + firstEntry;
+    for (std::uint32_t i = 0; i < entryCount; ++i) {
+        const bool isSection = (e[i] & kSectionBit) != 0;
+        if (isSection != wantSection)
+            continue;
+        const std::uint32_t at = e[i] & ~kSectionBit;
+        const std::int64_t entryName = isSection ? sections[at].name_ : keywords[at].name_;
+        if (entryName == id && --n == 0)
+            return at;
+    }
+    return -1;
 }
 
 std::string Diagnostic::ToString() const {

@@ -113,8 +113,12 @@ struct Document::Impl {
     };
     mutable std::unordered_map<std::uint32_t, LookupIndex> lookupIndexes;
     static constexpr std::uint32_t kIndexedEntries = 64;
-    const LookupIndex& IndexOf(const Section& s, std::uint32_t sectionIndex,
-                               std::uint32_t firstEntry, std::uint32_t entryCount) const;
+    const LookupIndex& IndexOf(std::uint32_t sectionIndex, std::uint32_t firstEntry,
+                               std::uint32_t entryCount) const;
+    // The table index of the n-th subsection (or keyword) of that name in a section, or -1.
+    std::int64_t FindEntry(std::uint32_t sectionIndex, std::uint32_t firstEntry,
+                           std::uint32_t entryCount, std::string_view name, int n,
+                           bool wantSection) const;
 
     std::size_t MemoryBytes() const;
 };
