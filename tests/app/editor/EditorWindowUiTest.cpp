@@ -15,6 +15,7 @@
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
 #include "setupeditor/NavigationTree.h"
+#include "support/SyncedFollower.h"
 #include "support/UiTestSupport.h"
 
 #include <QApplication>
@@ -36,6 +37,9 @@
 
 #include <memory>
 
+using testsupport::Follower;
+using testsupport::Titles;
+
 namespace {
 
 const QString kExample = QStringLiteral(MUD_SOURCE_DIR "/examples/estuary.setup");
@@ -50,48 +54,6 @@ bool WriteAll(const QString& path, const QByteArray& bytes) {
     return f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(bytes) == bytes.size();
 }
 
-// A list of another module with one item per item of a host list, as the module's boundary
-// and source lists are. Items remember the master item they were made for.
-class FollowerItem : public CZoSEKivBase {
-public:
-    explicit FollowerItem(CZoSEKivBase* parent) : CZoSEKivBase("", "", parent) {}
-    CString tag;
-};
-
-template <class Master>
-class Follower : public CZoSEKivListBase<FollowerItem> {
-public:
-    explicit Follower(Master* master)
-        : CZoSEKivListBase<FollowerItem>("Follower", "", master->GetRoot()), m_master(master) {
-        SetItemCount(master->GetItemCount(), 1);
-        master->RegisterSyncedList(this, 1);
-        Tag();
-    }
-    ~Follower() override { m_master->UnRegisterSyncedList(this); }
-    // Items made since the last call take the name of the master item at their place.
-    void Tag() {
-        for (int i = 1; i <= GetItemCount(); ++i)
-            if (GetItem(i)->tag.empty())
-                GetItem(i)->tag = m_master->GetItemNode(i)->GetTitle();
-    }
-    std::vector<CString> Tags() {
-        std::vector<CString> out;
-        for (int i = 1; i <= GetItemCount(); ++i)
-            out.push_back(GetItem(i)->tag);
-        return out;
-    }
-
-private:
-    Master* m_master;
-};
-
-template <class List>
-std::vector<CString> Titles(List* list) {
-    std::vector<CString> out;
-    for (int i = 1; i <= list->GetItemCount(); ++i)
-        out.push_back(list->GetItemNode(i)->GetTitle());
-    return out;
-}
 
 class EditorTest : public ::testing::Test {
 protected:

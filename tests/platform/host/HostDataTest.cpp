@@ -1,6 +1,7 @@
 // The host's own data: domain with its boundaries, simulation period, sources, density,
 // wind forcing, and the lists of other modules that follow the boundaries and sources.
 #include "TestSupport.h"
+#include "support/SyncedFollower.h"
 
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/DomainKiv.h"
@@ -16,46 +17,6 @@
 using namespace testsupport;
 
 namespace {
-
-// A list of another module that holds one item per item of a host list. Each item
-// remembers the master item it was made for, so moves can be followed.
-class SyncedItem : public CZoSEKivBase {
-public:
-    explicit SyncedItem(CZoSEKivBase* parent) : CZoSEKivBase("Item %d", "ITEM_%d", parent) {}
-    CString tag;
-};
-
-class SyncedList : public CZoSEKivListBase<SyncedItem> {
-public:
-    SyncedList(CZoSEKivListBaseInterface* master)
-        : CZoSEKivListBase<SyncedItem>("Synced", "SYNCED", master->GetRoot()), m_master(master) {
-        SetItemCount(master->GetItemCount(), 1);
-        Tag();
-    }
-    // New items take the title of the master item at their place.
-    void Tag() {
-        for (int i = 1; i <= GetItemCount(); ++i)
-            if (GetItem(i)->tag.empty())
-                GetItem(i)->tag = m_master->GetItemNode(i)->GetTitle();
-    }
-    std::vector<CString> Tags() {
-        std::vector<CString> out;
-        for (int i = 1; i <= GetItemCount(); ++i)
-            out.push_back(GetItem(i)->tag);
-        return out;
-    }
-
-private:
-    CZoSEKivListBaseInterface* m_master;
-};
-
-template <class List>
-std::vector<CString> Titles(List* list) {
-    std::vector<CString> out;
-    for (int i = 1; i <= list->GetItemCount(); ++i)
-        out.push_back(list->GetItemNode(i)->GetTitle());
-    return out;
-}
 
 // Counts domain messages by code.
 class DomainSpy : public CFemListener {
@@ -182,8 +143,7 @@ TEST(HostData, SyncedListsFollowEveryChangeOfTheBoundaries) {
     CSetupDocument doc;
     CBoundaryNamesKiv* names = doc.GetBoundaryNames();
     names->Append()->Identifier("Sea");
-    SyncedList synced(names);
-    names->RegisterSyncedList(&synced, 1);
+    Follower synced(names);
 
     names->Append()->Identifier("Elbe");
     synced.Tag();
@@ -215,14 +175,12 @@ TEST(HostData, SyncedListsFollowEveryChangeOfTheBoundaries) {
         "  BOUNDARY_1 {\n   name = \"A\"\n  }\n  BOUNDARY_2 {\n   name = \"B\"\n  }\n }\n}\n");
     ASSERT_TRUE(loaded);
     EXPECT_EQ(Titles(loaded->GetBoundaryConditions()), (std::vector<CString>{"A", "B"}));
-    names->UnRegisterSyncedList(&synced);
 }
 
 TEST(HostData, SyncedListsFollowEveryChangeOfTheSources) {
     CSetupDocument doc;
     CHDSourcesKiv* sources = doc.GetSources();
-    SyncedList synced(sources);
-    sources->RegisterSyncedList(&synced, 1);
+    Follower synced(sources);
 
     sources->Append()->Name("Outfall");
     synced.Tag();
@@ -240,7 +198,6 @@ TEST(HostData, SyncedListsFollowEveryChangeOfTheSources) {
     EXPECT_EQ(sources->GetItem(1)->GetSectionName(), "SOURCE_1");
     sources->SetItemCount(0, 1);
     EXPECT_EQ(synced.GetItemCount(), 0);
-    sources->UnRegisterSyncedList(&synced);
 }
 
 TEST(HostData, DomainChangesReachItsListeners) {
