@@ -307,6 +307,13 @@ int New(const NewOptions& o) {
         h.count = o.nodes ? o.nodes : o.elements;
     }
 
+    if (*kind == datafile::Kind::LineSeries && h.points == 0)
+        return Fail("a line series needs --points N");
+    if (*kind == datafile::Kind::Grid && h.columns == 0)
+        return Fail("a 2D grid needs --grid COLUMNS,ROWS");
+    if (*kind == datafile::Kind::MeshData && h.count == 0)
+        return Fail("mesh data needs --nodes N or --elements N");
+
     std::optional<std::int64_t> start;
     if (!o.start.empty()) {
         start = datafile::ParseDateTime(o.start);
