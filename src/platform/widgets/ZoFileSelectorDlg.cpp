@@ -353,6 +353,10 @@ ZoFileSelectorHook ZoSetFileSelectorHook(ZoFileSelectorHook hook) {
     return previous;
 }
 
+int ZoRunFileSelector(CZoFileSelectorDlg& dialog) {
+    return Hook() ? Hook()(dialog) : dialog.DoModal();
+}
+
 bool ZoSelectDataFile(ZoSEQrdSelection* node, const CString& filter, const CString& defaultExt,
                       QWidget* parent) {
     if (!node)
@@ -361,8 +365,7 @@ bool ZoSelectDataFile(ZoSEQrdSelection* node, const CString& filter, const CStri
     dialog.SetBaseFolder(CZoFileSelector(node).BaseFolder());
     node->SetUpFileSelector(dialog);
     dialog.SetSelectedItems(node->ItemNumber());
-    const int result = Hook() ? Hook()(dialog) : dialog.DoModal();
-    if (result != QDialog::Accepted)
+    if (ZoRunFileSelector(dialog) != QDialog::Accepted)
         return false;
     node->FileName(dialog.FileName());
     node->ItemNumber(dialog.SelectedItems());

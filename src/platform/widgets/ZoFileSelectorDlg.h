@@ -100,7 +100,11 @@ public:
 bool ZoSelectDataFile(ZoSEQrdSelection* node, const CString& filter, const CString& defaultExt,
                       QWidget* parent);
 
-// Selector dialogs shown by ZoSelectDataFile go through this hook while it is set, so that
+// Shows a prepared selector modally (or hands it to the hook below): QDialog::Accepted or
+// QDialog::Rejected.
+int ZoRunFileSelector(CZoFileSelectorDlg& dialog);
+
+// Selector dialogs shown by ZoSelectDataFile and ZoRunFileSelector go through this hook while it is set, so that
 // tests drive them without a modal loop: it returns what DoModal would.
 using ZoFileSelectorHook = std::function<int(CZoFileSelectorDlg& dialog)>;
 ZoFileSelectorHook ZoSetFileSelectorHook(ZoFileSelectorHook hook);
