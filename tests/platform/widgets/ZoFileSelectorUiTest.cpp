@@ -286,7 +286,7 @@ TEST(DataInputValue, SelectsItsFileAndItemWithTheSelectorAndViewsIt) {
 
     ASSERT_TRUE(form.ViewButton()->isEnabled());
     QTest::mouseClick(form.ViewButton(), Qt::LeftButton);
-    CZoDataViewerDlg* viewer = form.findChild<CZoDataViewerDlg*>();
+    CZoDataViewerDlg* viewer = owner.findChild<CZoDataViewerDlg*>();
     ASSERT_TRUE(viewer);
     EXPECT_EQ(viewer->Items(), std::vector<int>{1});
     viewer->close();
