@@ -242,7 +242,8 @@ TEST(ParamFileWriter, WritesCanonicalFormAndIsIdempotent) {
     const std::string messy = "# comment\nTop{a=1,2 ,3\n  Inner {\n\t\tb =\n"
                               "   c = 1e7,0.001,-.33, 100.0, 123456789012345680.0\n"
                               "d = \"tab\there\" , 'it''s'\n}}\nNext {\n}\n";
-    const std::string want = "Top {\n"
+    const std::string want = "# comment\n"
+                             "Top {\n"
                              "    a = 1, 2, 3\n"
                              "    Inner {\n"
                              "        b =\n"
