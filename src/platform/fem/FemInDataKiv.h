@@ -51,6 +51,10 @@ public:
 
     // The formats this value may take, constant first.
     std::vector<int> AllowedFormats() const;
+    bool IsFormatAllowed(int format) const;
+    // On reading: a warning at the value's "format" keyword of section h when the format is
+    // not one the value may take (it is kept as read, and validation reports it).
+    void WarnUnlessFormatAllowed(void* h) const;
     static CString FormatName(int format);
     // One line for grids: "Constant" or the kind of variation.
     CString FormatText() const;
