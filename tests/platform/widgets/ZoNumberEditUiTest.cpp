@@ -110,6 +110,17 @@ TEST_F(FieldDialog, RefusedEntriesLeaveTheValueAndShowItAgain) {
                                     "Please enter a number."}));
     Enter(field, "10");
     EXPECT_DOUBLE_EQ(velocity, 0.01);
+
+    // A double saved as a float: beyond the float range is refused, not saved as inf.
+    double concentration = 50.0;
+    auto* big = new CZoNumberEdit(CZoEditStyle().SetFloatRange(), &dialog);
+    big->BindDouble(&dialog, concentration);
+    Enter(big, "1e42");
+    EXPECT_EQ(concentration, 50.0);
+    EXPECT_EQ(messages.Messages().back(),
+              "Please enter a number between -3.4028234663852886e+38 and 3.4028234663852886e+38.");
+    Enter(big, "3e38");
+    EXPECT_EQ(concentration, 3e38);
 }
 
 TEST_F(FieldDialog, FloatsIntsAndFormatsShowAndReadAsTheirKind) {
