@@ -1,5 +1,5 @@
-// Reads any input; whatever reads must write, read back and write again to the same text,
-// and every kiv getter must cope with every value it finds. The same bytes also drive the
+// Reads any input; whatever reads must write, read back and write again to the same text
+// (comments included), and every kiv getter must cope with every value it finds. The same bytes also drive the
 // builder, and every value built must read back with the same bits.
 #include "paramfile/Kiv.h"
 #include "paramfile/ParamFile.h"
@@ -240,10 +240,16 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const std::string second = WriteText(*again.document);
     Check(second == first, "writing is not idempotent", first + "\n----\n" + second);
 
-    // A deep copy writes the same text as its original.
+    // Before any look-up nothing counts as read: each top-level section is reported once.
+    Check(UnreadEntries(r.document->Root(), "").size() ==
+              static_cast<std::size_t>(r.document->Root().EntryCount()),
+          "unread entries miscounted", first);
+
+    // A deep copy writes the same text as its original, comments and all.
     Document copy;
     {
         Builder b(copy);
+        b.TakeCommentsFrom(*r.document);
         for (int i = 0; i < r.document->Root().EntryCount(); ++i)
             b.CopySection(r.document->Root().SectionAt(i));
     }
