@@ -87,6 +87,8 @@ CMTDispersionItemKiv::CMTDispersionItemKiv(CZoSEKivBase* parent)
                                                     false, false, 0.01, 100153, this)) {
     m_eddyViscosity->QrdData()->ItemNumbers({1});
     m_coefficient->QrdData()->ItemNumbers({1});
+    m_eddyViscosity->ConstantIsFloat(true);
+    m_coefficient->ConstantIsFloat(true);
 }
 
 CMTDispersionItemKiv::~CMTDispersionItemKiv() = default;

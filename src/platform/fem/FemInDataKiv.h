@@ -34,6 +34,9 @@ public:
     double Constant() const { return m_constant; }
     void Constant(double value) { m_constant = value; }
     double DefaultConstant() const { return m_default; }
+    // Where the owner saves the constant as a float, forms refuse numbers beyond its range.
+    bool ConstantIsFloat() const { return m_constantIsFloat; }
+    void ConstantIsFloat(bool isFloat) { m_constantIsFloat = isFloat; }
     int Format() const { return m_format; }
     void Format(int format) { m_format = format; }
     int FormatCode() const { return m_formatCode; }
@@ -75,6 +78,7 @@ private:
     long m_itemType;
     std::vector<long> m_furtherItemTypes;
     bool m_disabled = false;
+    bool m_constantIsFloat = false;
     int m_type = 0;
     CFemInDataFile m_file;
 };

@@ -83,6 +83,8 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
 void CFemInDataDlg::SetConstantStyle(const CZoEditStyle& style) {
     CZoEditStyle s = style;
     s.SetOvuUnitBaseGroup(m_data->ItemType());
+    if (m_data->ConstantIsFloat())
+        s.SetFloatRange();
     m_constant->SetStyle(s);
     const CString unit = s.UnitName();
     m_unit->setText(unit == "()" ? QString() : QString::fromStdString(unit));

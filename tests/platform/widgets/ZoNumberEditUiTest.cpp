@@ -235,6 +235,17 @@ TEST_F(InDataSubForm, BadItemNumbersAndCancelledBrowsingStoreNothing) {
     EXPECT_TRUE(host.hints.empty());
 }
 
+TEST_F(InDataSubForm, AFormatTheValueMayNotTakeIsShownAsRead) {
+    data->Format(8);  // vertical, from a file; the value varies in time and domain only
+    form->SetData();
+    QComboBox* format = form->FormatBox();
+    EXPECT_EQ(format->currentText(), "Varying in vertical");
+    EXPECT_EQ(format->count(), 5);
+    Choose(format, "Varying in domain");
+    EXPECT_EQ(data->Format(), 2);
+    EXPECT_EQ(format->count(), 4);
+}
+
 TEST_F(InDataSubForm, DisabledFormsAndValuesOfferNoControls) {
     form->EnableControls(false);
     for (QWidget* w : form->findChildren<QWidget*>()) {
