@@ -10,6 +10,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 using namespace paramfile;
@@ -29,6 +30,7 @@ void ReadEverything(const Section& root) {
         const Section* s = todo.back();
         todo.pop_back();
         void* h = const_cast<Section*>(s);
+        std::unordered_map<std::string, int> seen;
         for (int i = 0; i < s->EntryCount(); ++i) {
             if (s->EntryIsSection(i)) {
                 todo.push_back(&s->SectionAt(i));
@@ -39,10 +41,9 @@ void ReadEverything(const Section& root) {
             }
             const Keyword& k = s->KeywordAt(i);
             const std::string name(k.Name());
-            int occurrence = 1;
-            for (const Keyword* found; (found = s->FindKeyword(name, occurrence)) != &k;
-                 ++occurrence)
-                Check(found != nullptr, "keyword not found by name", name);
+            // Counted as the entries pass, so that long sections of one name stay linear.
+            const int occurrence = ++seen[name];
+            Check(s->FindKeyword(name, occurrence) == &k, "keyword not found by name", name);
             void* kw = kivKeywordByNameNum(h, name.c_str(), occurrence);
             Check(kw == &k, "keyword not found by occurrence", name);
             for (int p = 0; p <= kivParamCount(kw) + 1; ++p) {
