@@ -205,12 +205,23 @@ TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
 TEST_F(Cli, InputThatIsNoSetupFileIsRefused) {
     ASSERT_EQ(::mkfifo(P("fifo").c_str(), 0600), 0);
     fs::create_directory(dir / "folder");
-    for (const std::string& input : {std::string("/dev/zero"), P("fifo"), P("folder")}) {
-        SCOPED_TRACE(input);
+    WriteFile(dir / "huge.setup", "");
+    fs::resize_file(dir / "huge.setup", 3ull << 30);  // sparse: no room taken
+    const struct {
+        std::string input;
+        const char* why;
+    } cases[] = {
+        {"/dev/zero", "not a regular file"},
+        {P("fifo"), "not a regular file"},
+        {P("folder"), "Is a directory"},
+        {P("huge.setup"), "larger than 2147483646 bytes"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.input);
         // A reader that waited or read on would be stopped by timeout (exit 124).
-        Result r = Mudsetup("validate " + input, "timeout 20 ");
+        Result r = Mudsetup("validate " + c.input, "timeout 20 ");
         EXPECT_EQ(r.exitCode, 2);
-        EXPECT_NE(r.err.find("cannot read '" + input + "'"), std::string::npos) << r.err;
+        EXPECT_EQ(r.err, c.input + ":0:0: cannot read '" + c.input + "': " + c.why + "\n");
     }
 }
 
