@@ -16,6 +16,8 @@ const char* const kUsage =
     "  format FILE [-o FILE]                        load and save again in the canonical\n"
     "                                               form (in place without -o; -o - prints it)\n"
     "  show FILE                                    the navigation tree, one node a line\n"
+    "  mesh info FILE                               a mesh's counts, extent and open\n"
+    "                                               boundaries (.2dm, UGRID .nc)\n"
     "\n"
     "A file that cannot be read or has a syntax error exits 2 with FILE:LINE:COLUMN.\n"
     "Every command answers --help.\n";
@@ -27,6 +29,7 @@ int main(int argc, char** argv) {
     CLI::App app(kUsage, "mudsetup");
     app.require_subcommand(1);
     cli::AddSetupCommands(app, status);
+    cli::AddMeshCommands(app, status);
     cli::AddCommand(app, "help", kUsage)->group("")->callback([] { std::cout << kUsage; });
     return cli::Run(app, argc, argv, status);
 }
