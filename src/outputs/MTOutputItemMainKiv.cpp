@@ -359,6 +359,59 @@ bool CMTOutputItemMainKiv::ImportXyz(const CString& path, CString* error) {
     return true;
 }
 
+namespace {
+size_t PolygonSize(int rows) { return rows <= 0 ? 0 : static_cast<size_t>(std::max(rows, 3)); }
+}  // namespace
+
+void CMTOutputItemMainKiv::GeometryToCoordList(bool resize) {
+    CMTOutputCoordListKiv* list = m_coordList;
+    if (UsesPoints()) {
+        if (!resize)
+            m_points.resize(static_cast<size_t>(list->GetItemCount()), MTOutputPoint{0, 0, 0, 0, ""});
+        list->SetItemCount(static_cast<int>(m_points.size()), 1);
+        for (size_t i = 0; i < m_points.size(); ++i) {
+            CMTOutputCoordItemKiv* row = list->GetItem(static_cast<int>(i + 1));
+            const MTOutputPoint& p = m_points[i];
+            row->X(p.x), row->Y(p.y), row->Z(p.z), row->Layer(p.layer), row->Name(p.name);
+        }
+    } else if (!UsesLine()) {
+        if (!resize)
+            m_polygon.resize(PolygonSize(list->GetItemCount()));
+        list->SetItemCount(static_cast<int>(m_polygon.size()), 1);
+        for (size_t i = 0; i < m_polygon.size(); ++i) {
+            CMTOutputCoordItemKiv* row = list->GetItem(static_cast<int>(i + 1));
+            row->X(m_polygon[i].x), row->Y(m_polygon[i].y);
+        }
+    } else {
+        list->SetItemCount(2, 1);
+        CMTOutputCoordItemKiv* first = list->GetItem(1);
+        CMTOutputCoordItemKiv* last = list->GetItem(2);
+        first->X(m_line.xFirst), first->Y(m_line.yFirst), first->Z(m_line.zFirst);
+        last->X(m_line.xLast), last->Y(m_line.yLast), last->Z(m_line.zLast);
+    }
+}
+
+void CMTOutputItemMainKiv::CoordListToGeometry() {
+    CMTOutputCoordListKiv* list = m_coordList;
+    const int rows = list->GetItemCount();
+    if (UsesLine()) {
+        if (const CMTOutputCoordItemKiv* first = list->GetItem(1))
+            m_line.xFirst = first->X(), m_line.yFirst = first->Y(), m_line.zFirst = first->Z();
+        if (const CMTOutputCoordItemKiv* last = list->GetItem(2))
+            m_line.xLast = last->X(), m_line.yLast = last->Y(), m_line.zLast = last->Z();
+    } else if (!UsesPoints()) {
+        m_polygon.resize(PolygonSize(rows));
+        for (int i = 1; i <= rows; ++i)
+            m_polygon[static_cast<size_t>(i - 1)] = {list->GetItem(i)->X(), list->GetItem(i)->Y()};
+    } else {
+        m_points.resize(static_cast<size_t>(rows));
+        for (int i = 1; i <= rows; ++i) {
+            const CMTOutputCoordItemKiv* row = list->GetItem(i);
+            m_points[static_cast<size_t>(i - 1)] = {row->X(), row->Y(), row->Z(), row->Layer(), row->Name()};
+        }
+    }
+}
+
 void CMTOutputItemMainKiv::Notify(CFemNotifier* notifier, ENotifyMessage message) {
     const CDomainKiv* domain = Domain(this);
     if (message == CDomainKiv::kThreeDChanged && domain && !domain->ThreeD()) {

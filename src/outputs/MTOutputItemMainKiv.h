@@ -94,6 +94,13 @@ public:
     // The result file's extension for the format (".qrd0", ".qrd1", ".qrdu").
     static const char* ExtensionOfFormat(int format);
 
+    // The coordinate table from the geometry in use. Without resize the geometry first takes
+    // the table's length (points new and zero; a polygon of at least three corners).
+    void GeometryToCoordList(bool resize);
+    // The geometry in use from the coordinate table. A polygon keeps at least three corners
+    // (those beyond the rows keep their values) unless the table is empty.
+    void CoordListToGeometry();
+
     // The checks of validation; messages are added only when report is true.
     bool CheckData(bool report);
     // Adds the points of an xyz file to the geometry in use: corners of a polygon, points of
