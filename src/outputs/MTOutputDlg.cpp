@@ -52,7 +52,13 @@ void CMTOutputDlg::SetData() {
             self->UpdateDoc(kHintTitleChanged);
         });
     }
+    Refresh();
+}
+
+void CMTOutputDlg::Refresh() {
     m_grid->Redraw();
+    m_grid->FitColumns();
+    m_grid->SizeToDialog();
 }
 
 void CMTOutputDlg::OnNew() {
@@ -62,7 +68,7 @@ void CMTOutputDlg::OnNew() {
     list->Append();
     // Named as it is appended, so that the grid shows the stored title.
     list->NameNewOutputs();
-    m_grid->Redraw();
+    Refresh();
     UpdateDoc(kHintItemsAdded);
     UpdateDoc(kHintItemsReordered);
 }
@@ -75,6 +81,6 @@ void CMTOutputDlg::OnDelete() {
     for (int row = ranges[0].top; row <= ranges[0].bottom; ++row)
         list->Delete(ranges[0].top, 1);
     m_grid->ClearSelection();
-    m_grid->Redraw();
+    Refresh();
     UpdateDoc(kHintItemsDeleted);
 }

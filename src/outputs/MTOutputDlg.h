@@ -17,6 +17,7 @@ public:
 
 private:
     CMTOutputKiv* List() const;
+    void Refresh();
     void OnNew();
     void OnDelete();
 

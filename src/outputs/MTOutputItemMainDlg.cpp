@@ -164,6 +164,8 @@ void CMTOutputItemMainDlg::Initialize() {
         o->GeometryToCoordList(true);
     }
     CZoSEDlgBase::Initialize();
+    // Widths from the rows in view: an output may hold a great many points.
+    m_grid->resizeColumnsToContents();
 }
 
 void CMTOutputItemMainDlg::FillCombos() {
