@@ -187,6 +187,8 @@ void CMTOutputItemMainKiv::ReadData(void* h) {
     kivGetParam(h, "format", &m_format, 1, 1);
     kivGetParam(h, "flood_and_dry", &m_floodAndDry, 1, 1);
     kivGetParam(h, "coordinate_type", &m_coordinateType, 1, 1);
+    // Always written as 0 and of no use when read; looked at so that it counts as known.
+    kivKeywordByNameNum(h, "zone", 1);
     kivGetParamFilename(h, "input_file_name", &m_inputFileName, 1, 1);
     kivGetParam(h, "input_format", &m_inputFormat, 1, 1);
     kivGetParam(h, "interpolation_type", &m_interpolationType, 1, 1);
