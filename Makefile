@@ -41,6 +41,7 @@ bench: build/release/build.ninja
 	build/release/bench/setup_bench
 	build/release/bench/datafile_bench
 	build/release/bench/mesh_bench
+	build/release/bench/output_bench
 	QT_QPA_PLATFORM=offscreen build/release/bench/map_bench
 
 build/fuzz/build.ninja: | deps

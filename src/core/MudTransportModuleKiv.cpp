@@ -6,6 +6,7 @@
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
 #include "bed/MTMorphologyKiv.h"
+#include "outputs/MTOutputKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
 #include "watercolumn/MTDispersionKiv.h"
@@ -25,6 +26,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTForcingsGroupKiv(this));
     AddChild(new CMTDispersionKiv(this));
     AddChild(new CMTMorphologyKiv(this));
+    AddChild(new CMTOutputKiv(this));
 }
 
 CMudTransportModuleKiv::~CMudTransportModuleKiv() { GetRoot()->UnregisterImportantNode(kKey); }

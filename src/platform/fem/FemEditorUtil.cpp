@@ -3,10 +3,19 @@
 #include "datafile/DataFile.h"
 
 bool CFemEditorUtil::ImportXYZ(const CString& file, std::vector<double>& x, std::vector<double>& y,
-                               std::vector<double>& z, std::vector<CString>& names, bool) {
+                               std::vector<double>& z, std::vector<CString>& names, bool flag) {
+    return ImportXYZ(file, x, y, z, names, flag, nullptr);
+}
+
+bool CFemEditorUtil::ImportXYZ(const CString& file, std::vector<double>& x, std::vector<double>& y,
+                               std::vector<double>& z, std::vector<CString>& names, bool,
+                               CString* error) {
     const datafile::XyzResult r = datafile::ReadXyz(file);
-    if (r.error)
+    if (r.error) {
+        if (error)
+            *error = r.error->ToString();
         return false;
+    }
     std::vector<double> xs, ys, zs;
     std::vector<CString> ns;
     for (const datafile::XyzPoint& p : r.points) {

@@ -12,4 +12,8 @@ public:
     // read or a line is malformed. The flag is kept for the callers and has no effect.
     static bool ImportXYZ(const CString& file, std::vector<double>& x, std::vector<double>& y,
                           std::vector<double>& z, std::vector<CString>& names, bool flag);
+    // The same, saying why a file was refused (FILE:LINE:COLUMN: message) in error.
+    static bool ImportXYZ(const CString& file, std::vector<double>& x, std::vector<double>& y,
+                          std::vector<double>& z, std::vector<CString>& names, bool flag,
+                          CString* error);
 };

@@ -47,6 +47,13 @@ QString ZoGetOpenFileName(QWidget* parent, const QString& caption, const QString
     return QFileDialog::getOpenFileName(parent, caption, startPath, filter);
 }
 
+QString ZoGetSaveFileName(QWidget* parent, const QString& caption, const QString& startPath,
+                          const QString& filter) {
+    if (FileHook())
+        return FileHook()(parent, caption, startPath, filter);
+    return QFileDialog::getSaveFileName(parent, caption, startPath, filter);
+}
+
 ZoOpenFileHook ZoSetOpenFileHook(ZoOpenFileHook hook) {
     ZoOpenFileHook previous = std::move(FileHook());
     FileHook() = std::move(hook);

@@ -20,6 +20,10 @@ ZoMessageSink ZoSetMessageSink(ZoMessageSink sink);
 QString ZoGetOpenFileName(QWidget* parent, const QString& caption, const QString& startPath,
                           const QString& filter);
 
+// Asks the user for a file to write (it need not exist); the same hook answers it.
+QString ZoGetSaveFileName(QWidget* parent, const QString& caption, const QString& startPath,
+                          const QString& filter);
+
 using ZoOpenFileHook = std::function<QString(QWidget* parent, const QString& caption,
                                              const QString& startPath, const QString& filter)>;
 // Replaces the file chooser; an empty function restores QFileDialog. Returns the previous.

@@ -157,8 +157,8 @@ TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
     };
     const Case cases[] = {
         {"clean", model + "    }\n}\n", nullptr, 0, 0},
-        {"unknown section", model + "    }\n    OUTPUTS {\n        a = 1\n    }\n}\n",
-         ":7:5: unknown section 'OUTPUTS'", 1, 1},
+        {"unknown section", model + "    }\n    PARTICLE_TRACKING {\n        a = 1\n    }\n}\n",
+         ":7:5: unknown section 'PARTICLE_TRACKING'", 1, 1},
         {"nested unknown section",
          model + "    }\n    FORCINGS {\n        WAVES {\n        }\n    }\n}\n",
          ":8:9: unknown section 'WAVES'", 1, 1},

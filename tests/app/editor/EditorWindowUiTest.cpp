@@ -386,12 +386,12 @@ TEST_F(EditorTest, WarningsFromReadingAreListed) {
 
 TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
     QByteArray text = ReadAll(kExample);
-    text.replace("MUD_TRANSPORT_MODULE {\n", "MUD_TRANSPORT_MODULE {\n    OUTPUTS {\n    }\n");
+    text.replace("MUD_TRANSPORT_MODULE {\n", "MUD_TRANSPORT_MODULE {\n    PARTICLE_TRACKING {\n    }\n");
     const QString path = m_dir.filePath("newer.setup");
     ASSERT_TRUE(WriteAll(path, text));
     ASSERT_TRUE(m_window->OpenFile(path));
     ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
-    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).contains("unknown section 'OUTPUTS'"));
+    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).contains("unknown section 'PARTICLE_TRACKING'"));
     // Validation keeps the warnings of reading above its own messages.
     m_window->Validate();
     ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 2);
@@ -400,12 +400,12 @@ TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
     m_answer = QMessageBox::Cancel;
     EXPECT_FALSE(m_window->SaveFile(path));
     ASSERT_EQ(m_prompts.size(), 1u);
-    EXPECT_TRUE(m_prompts[0].contains("unknown section 'OUTPUTS'"));
+    EXPECT_TRUE(m_prompts[0].contains("unknown section 'PARTICLE_TRACKING'"));
     EXPECT_EQ(ReadAll(path), text);
 
     m_answer = QMessageBox::Save;
     EXPECT_TRUE(m_window->SaveFile(path));
-    EXPECT_FALSE(ReadAll(path).contains("OUTPUTS"));
+    EXPECT_FALSE(ReadAll(path).contains("PARTICLE_TRACKING"));
     // Once saved, the setup and the file agree: nothing more to ask.
     EXPECT_TRUE(m_window->SaveFile(path));
     EXPECT_EQ(m_prompts.size(), 2u);

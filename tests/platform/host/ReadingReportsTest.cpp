@@ -65,8 +65,8 @@ TEST(ReadingReports, EachCaseAtItsPlace) {
          "unknown keyword 'rho_sedimnet' in MUD_TRANSPORT_MODULE/MODEL_DEFINITION: not read, "
          "dropped on saving",
          nullptr, true},
-        {"section of a later version", Module("    @OUTPUTS {\n        a = 1\n    }\n"),
-         "unknown section 'OUTPUTS' in MUD_TRANSPORT_MODULE", nullptr, true},
+        {"section of a later version", Module("    @PARTICLE_TRACKING {\n        a = 1\n    }\n"),
+         "unknown section 'PARTICLE_TRACKING' in MUD_TRANSPORT_MODULE", nullptr, true},
         {"subsystem not built", Module("    FORCINGS {\n        @WAVES {\n        }\n    }\n"),
          "unknown section 'WAVES' in MUD_TRANSPORT_MODULE/FORCINGS", nullptr, true},
         {"repeated keyword", Module("    @mode = 2\n"),
@@ -154,7 +154,7 @@ TEST(ReadingReports, ValuesStayAsTheyWereOrAsRead) {
 }
 
 TEST(ReadingReports, DroppedContentIsForgottenOnceSaved) {
-    auto r = CSetupDocument::FromText(Module("    OUTPUTS {\n    }\n"), "case.setup");
+    auto r = CSetupDocument::FromText(Module("    PARTICLE_TRACKING {\n    }\n"), "case.setup");
     ASSERT_EQ(r.document->DroppedOnSave().size(), 1u);
     const std::string path = ::testing::TempDir() + "dropped.setup";
     std::string error;
@@ -182,7 +182,7 @@ TEST(ReadingReports, CommentsSurviveInForeignAndModuleSections) {
                              "        # last in the definition\n"
                              "    }\n"
                              "    # gone with what it stood before\n"
-                             "    OUTPUTS {\n"
+                             "    PARTICLE_TRACKING {\n"
                              "    }\n"
                              "}\n"
                              "# end of the file\n";

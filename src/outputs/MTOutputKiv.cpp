@@ -1,0 +1,48 @@
+#include "MTOutputKiv.h"
+
+#include "paramfile/Kiv.h"
+
+namespace {
+const char* const kKey = "MTOutputs";
+}
+
+CMTOutputKiv::CMTOutputKiv(CZoSEKivBase* parent)
+    : CZoSEKivListBase("Outputs", "OUTPUTS", parent) {
+    SetItemCount(0, 1);
+    GetRoot()->RegisterImportantNode(this, kKey);
+}
+
+CMTOutputKiv::~CMTOutputKiv() { GetRoot()->UnregisterImportantNode(kKey); }
+
+bool CMTOutputKiv::NameNewOutputs() {
+    bool renamed = false;
+    for (int i = 1; i <= GetItemCount(); ++i) {
+        CMTOutputItemMainKiv* output = GetItem(i);
+        if (output->Title().starts_with("OUTPUTXXX")) {
+            output->Title(FormatString("Output %d", i));
+            renamed = true;
+        }
+    }
+    return renamed;
+}
+
+void CMTOutputKiv::WriteData(void* h) { kivPutParam(h, "number_of_outputs", GetItemCount()); }
+
+void CMTOutputKiv::ReadData(void* h) {
+    if (!kivKeywordByNameNum(h, "number_of_outputs", 1))
+        return;
+    int n = GetItemCount();
+    kivGetParam(h, "number_of_outputs", &n, 1, 1);
+    if (n < 0 || n > kMaxListItemCount) {
+        kivWarn(h, "number_of_outputs",
+                FormatString("number_of_outputs = %d is not between 0 and %d; kept %d", n,
+                             kMaxListItemCount, GetItemCount()));
+        return;
+    }
+    SetItemCount(n, 1);
+}
+
+const char* CMTOutputKiv::GetDlgRuntimeClass(unsigned code) {
+    return code == kDlgRuntimeClassRequest ? "CMTOutputDlg"
+                                           : CZoSEKivListBase::GetDlgRuntimeClass(code);
+}
