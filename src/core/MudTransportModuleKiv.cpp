@@ -6,6 +6,7 @@
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
 #include "bed/MTMorphologyKiv.h"
+#include "dredging/MTDredgingKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
 #include "watercolumn/MTDispersionKiv.h"
@@ -23,6 +24,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTWaterColumnKiv(this));
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
+    AddChild(new CMTDredgingKiv(this));
     AddChild(new CMTDispersionKiv(this));
     AddChild(new CMTMorphologyKiv(this));
 }
