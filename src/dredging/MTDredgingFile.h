@@ -3,6 +3,7 @@
 #include "setupeditor/ZoSEQrdSelection.h"
 
 #include <array>
+#include <vector>
 
 class CMTDredgingItemsKiv;
 
@@ -22,6 +23,12 @@ public:
 
     // Four requests: x and y in the dredger's projection, the rate and the spill.
     void SetUpFileSelector(CZoFileSelector& selector) override;
+
+    // The positions of the track (items x and y, in the dredger's projection), at most
+    // kMaxTrackPoints of them; points that are not numbers are left out. False, with the
+    // reason, when the file cannot be read. Tracks are kept by file, size and time.
+    static constexpr int kMaxTrackPoints = 100000;
+    bool ReadTrack(std::vector<double>& x, std::vector<double>& y, CString* error = nullptr) const;
 
     void WriteData(void*) override {}
     void ReadData(void*) override {}

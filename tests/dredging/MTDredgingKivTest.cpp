@@ -392,3 +392,32 @@ TEST(MTDredgingKiv, TheSharedDredgerKeyNeverOutlivesTheDredgerItNames) {
     list->Delete(1, 1);
     EXPECT_EQ(doc.GetImportantNode("MTDredging"), nullptr);
 }
+
+TEST(MTDredgingKiv, TheTrackIsReadFromItemsXAndYAndAgainWhenTheFileChanges) {
+    TempDir dir;
+    const std::string path = dir.Write(
+        "track.qrd0", "qrd0 1\nstart 2024-01-01 00:00\nstep 3600\nsteps 3\nitems 4\n"
+                      "item y 100183\nitem x 100183\nitem r 100195\nitem s 100013\nvalues\n"
+                      "10 1 0 0\nnan 2 0 0\n30 3 0 0\n");
+    CSetupDocument doc;
+    CMTDredgingItemsKiv* d = Dredging(doc)->Append();
+    d->DataFile()->FileName(path);
+    d->DataFile()->ItemNumber(std::vector<int>{2, 1, 3, 4});
+    std::vector<double> x, y;
+    ASSERT_TRUE(d->DataFile()->ReadTrack(x, y));
+    // The step whose y is not a number is left out.
+    EXPECT_EQ(x, (std::vector<double>{1, 3}));
+    EXPECT_EQ(y, (std::vector<double>{10, 30}));
+
+    dir.Write("track.qrd0", "qrd0 1\nstart 2024-01-01 00:00\nstep 3600\nsteps 1\nitems 4\n"
+                            "item y 100183\nitem x 100183\nitem r 100195\nitem s 100013\nvalues\n"
+                            "5 6 0 0\n");
+    ASSERT_TRUE(d->DataFile()->ReadTrack(x, y));
+    EXPECT_EQ(x, (std::vector<double>{6}));
+
+    CString error;
+    d->DataFile()->FileName(dir.Path("none.qrd0"));
+    EXPECT_FALSE(d->DataFile()->ReadTrack(x, y, &error));
+    EXPECT_NE(error.find("does not exist"), CString::npos) << error;
+    EXPECT_TRUE(x.empty());
+}
