@@ -17,7 +17,12 @@ void CMTDredgingGrid::Refresh() {
 void CMTDredgingGrid::GetStyleRowCol(int row, int col, CGridCellStyle& style) {
     // The row heading is the dredger's number; its name has a column of its own.
     if (row >= 1 && col == 0) {
-        style.SetStatic(FormatString("%d", row)).SetAlign(ZoCellAlign::Center);
+        // Padded so that the row headings are as wide as the corner's "Dredger No.".
+        CString text = FormatString("%d", row);
+        const int wanted = fontMetrics().horizontalAdvance("Dredger No.");
+        while (fontMetrics().horizontalAdvance(QString::fromStdString(text)) < wanted)
+            text = " " + text + " ";
+        style.SetStatic(text).SetAlign(ZoCellAlign::Center);
         return;
     }
     CFemGridEditWnd::GetStyleRowCol(row, col, style);
