@@ -161,9 +161,9 @@ void CMTDredgingItemsKiv::ReadWeights(void* h) {
     m_weights = std::move(read);
     if (count > fractions)
         kivWarn(h, kWeights,
-                FormatString("'%s' holds %d values for %d fraction%s; the last %d are dropped",
+                FormatString("'%s' holds %d values for %d fraction%s; the last %d %s dropped",
                              kWeights, count, fractions, fractions == 1 ? "" : "s",
-                             count - fractions));
+                             count - fractions, count - fractions == 1 ? "is" : "are"));
 }
 
 void CMTDredgingItemsKiv::ReadDataFile(void* h) {
