@@ -6,6 +6,7 @@
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
 #include "bed/MTMorphologyKiv.h"
+#include "dredging/MTDredgingKiv.h"
 #include "outputs/MTOutputKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
@@ -24,6 +25,7 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTWaterColumnKiv(this));
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
+    AddChild(new CMTDredgingKiv(this));
     AddChild(new CMTDispersionKiv(this));
     AddChild(new CMTMorphologyKiv(this));
     AddChild(new CMTOutputKiv(this));

@@ -21,6 +21,7 @@
 
 #include <QApplication>
 #include <QCheckBox>
+#include <QDir>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
@@ -80,6 +81,13 @@ protected:
     QString CopyOfExample(const QString& name = "estuary.setup") {
         const QString path = m_dir.filePath(name);
         EXPECT_TRUE(WriteAll(path, ReadAll(kExample)));
+        // The data files it names, beside it as they are beside the example.
+        const QDir data(QStringLiteral(MUD_SOURCE_DIR "/examples/data"));
+        QDir().mkpath(m_dir.filePath("data"));
+        for (const QString& f : data.entryList(QDir::Files))
+            if (!QFile::exists(m_dir.filePath("data/" + f))) {
+                EXPECT_TRUE(QFile::copy(data.filePath(f), m_dir.filePath("data/" + f)));
+            }
         return path;
     }
 
