@@ -5,10 +5,13 @@
 #include "EditorWindow.h"
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/DomainKiv.h"
+#include "projection/ZoMapProjection.h"
 #include "widgets/GisNavigationDlg.h"
+#include "widgets/ZoProjectionCombo.h"
 #include "widgets/ZoPrompts.h"
 
 #include <QFile>
+#include <QLineEdit>
 #include <QPushButton>
 #include <QTableWidget>
 #include <QTemporaryDir>
@@ -128,6 +131,37 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
 
     ZoSetOpenFileHook(previous);
     ZoSetMessageSink(sink);
+}
+
+TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN"));
+    auto* combo = m_window->CurrentDialog()->findChild<CZoProjectionCombo*>();
+    ASSERT_NE(combo, nullptr);
+    EXPECT_EQ(combo->count(), static_cast<int>(CZoMapProjection::Entries().size()));
+    EXPECT_EQ(combo->Projection(), "UTM-32");
+    CDomainKiv* domain = m_window->Document().GetDomain();
+
+    QStringList messages;
+    const ZoMessageSink sink = ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    auto type = [&](const QString& text) {
+        combo->lineEdit()->setText(text);
+        emit combo->lineEdit()->editingFinished();
+    };
+    type("EPSG:25832");
+    EXPECT_EQ(domain->Projection(), "EPSG:25832");
+    type("MERCATOR");
+    EXPECT_EQ(domain->Projection(), "EPSG:25832");
+    ASSERT_EQ(messages.size(), 1);
+    EXPECT_EQ(messages[0], "\"MERCATOR\" is not a known projection.");
+    combo->setCurrentIndex(combo->findText("UTM-33"));
+    emit combo->activated(combo->currentIndex());
+    EXPECT_EQ(domain->Projection(), "UTM-33");
+    ZoSetMessageSink(sink);
+
+    // A stored string the registry does not list is shown as it is.
+    domain->Projection("GK-3");
+    m_window->CurrentDialog()->SetData();
+    EXPECT_EQ(combo->Projection(), "GK-3");
 }
 
 }  // namespace
