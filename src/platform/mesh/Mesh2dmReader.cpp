@@ -10,10 +10,10 @@
 #include "MeshReader.h"
 
 #include <charconv>
-#include <cstdint>
-#include <optional>
 #include <cmath>
+#include <cstdint>
 #include <fstream>
+#include <optional>
 #include <sstream>
 #include <unordered_map>
 #include <unordered_set>
@@ -90,7 +90,8 @@ public:
             const auto it = m_sparse.find(id);
             return it == m_sparse.end() ? -1 : it->second;
         }
-        return id > 0 && static_cast<size_t>(id) < m_dense.size() ? m_dense[static_cast<size_t>(id)] : -1;
+        return id > 0 && static_cast<size_t>(id) < m_dense.size() ? m_dense[static_cast<size_t>(id)]
+                                                                  : -1;
     }
 
 private:
@@ -108,7 +109,7 @@ struct PendingString {
 
 struct Parser {
     CMesh& mesh;
-    std::vector<long long> elementIds;  // node ids, four per element (0 for none)
+    std::vector<long long> elementIds; // node ids, four per element (0 for none)
     std::vector<size_t> elementLines;
     std::vector<PendingString> strings;
     bool inString = false;
@@ -196,7 +197,8 @@ struct Parser {
             if (t.Next(tok)) {
                 long long code = 0;
                 if (!ToInt(tok, code) || code < INT32_MIN || code > INT32_MAX)
-                    return Error{line, "node string: code " + std::string(tok) + " is not a number"};
+                    return Error{line,
+                                 "node string: code " + std::string(tok) + " is not a number"};
                 ns.code = static_cast<int>(code);
                 ns.hasCode = true;
                 std::string_view name = t.Rest();
@@ -211,7 +213,8 @@ struct Parser {
 
     std::optional<Error> Finish() {
         if (inString)
-            return Error{strings.back().line, "node string not ended (its last node id must be negative)"};
+            return Error{strings.back().line,
+                         "node string not ended (its last node id must be negative)"};
         if (mesh.x.empty())
             return Error{0, "no nodes (ND)"};
         if (elementLines.empty())
@@ -252,7 +255,7 @@ struct Parser {
     }
 };
 
-}  // namespace
+} // namespace
 
 MeshReadResult Read2dm(std::string_view text, const std::string& fileName) {
     auto mesh = std::make_shared<CMesh>();
@@ -295,8 +298,9 @@ MeshReadResult ReadMeshFile(const std::string& path) {
         return {nullptr, path + ": cannot be opened"};
     char magic[4] = {};
     in.read(magic, 4);
-    if (in.gcount() == 4 && ((magic[0] == 'C' && magic[1] == 'D' && magic[2] == 'F') ||
-                             (magic[0] == '\x89' && magic[1] == 'H' && magic[2] == 'D' && magic[3] == 'F')))
+    if (in.gcount() == 4 &&
+        ((magic[0] == 'C' && magic[1] == 'D' && magic[2] == 'F') ||
+         (magic[0] == '\x89' && magic[1] == 'H' && magic[2] == 'D' && magic[3] == 'F')))
         return ReadUgrid(path);
     in.clear();
     in.seekg(0);

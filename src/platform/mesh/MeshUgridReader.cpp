@@ -37,7 +37,8 @@ public:
     std::string TextAtt(int var, const char* name) const {
         nc_type type;
         size_t len = 0;
-        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type != NC_CHAR || len > (1 << 20))
+        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type != NC_CHAR ||
+            len > (1 << 20))
             return {};
         std::string s(len, '\0');
         if (nc_get_att_text(m_id, var, name, s.data()) != NC_NOERR)
@@ -132,7 +133,8 @@ int TopologyVariable(const File& f) {
             if (dim == 2)
                 return v;
         }
-    throw Fail{"no variable with cf_role = \"mesh_topology\" and topology_dimension 2 (not a UGRID mesh)"};
+    throw Fail{
+        "no variable with cf_role = \"mesh_topology\" and topology_dimension 2 (not a UGRID mesh)"};
 }
 
 // Node indices from 0 in an edge or face table, with the fill value as -1.
@@ -141,7 +143,9 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
     const std::vector<size_t> shape = f.Shape(var);
     if (shape.size() != 2 || (columns && shape[1] != columns) || shape[1] < 3 - (columns == 2) ||
         shape[1] > 4)
-        throw Fail{what + " must have " + (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) + " a row"};
+        throw Fail{what + " must have " +
+                   (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) +
+                   " a row"};
     rows = shape[0];
     if (rows > (size_t(1) << 31) / shape[1])
         throw Fail{what + " is too large"};
@@ -272,7 +276,7 @@ std::string Projection(const File& f, int xVar) {
                                         : std::string();
 }
 
-}  // namespace
+} // namespace
 
 MeshReadResult ReadUgrid(const std::string& path) {
     File f(path);
@@ -287,7 +291,8 @@ MeshReadResult ReadUgrid(const std::string& path) {
             throw Fail{topoName + ": node_coordinates must name two variables"};
         const int xVar = f.Var(coords[0]), yVar = f.Var(coords[1]);
         if (xVar < 0 || yVar < 0)
-            throw Fail{topoName + ": node coordinate " + coords[xVar < 0 ? 0 : 1] + " does not exist"};
+            throw Fail{topoName + ": node coordinate " + coords[xVar < 0 ? 0 : 1] +
+                       " does not exist"};
         const std::vector<size_t> xShape = f.Shape(xVar);
         if (xShape.size() != 1 || xShape[0] == 0)
             throw Fail{"no nodes in " + coords[0]};
@@ -301,7 +306,8 @@ MeshReadResult ReadUgrid(const std::string& path) {
             if (f.TextAtt(v, "mesh") != topoName || f.TextAtt(v, "location") != "node")
                 continue;
             const std::string sn = f.TextAtt(v, "standard_name");
-            const bool down = f.TextAtt(v, "positive") == "down" || sn.rfind("sea_floor_depth", 0) == 0;
+            const bool down =
+                f.TextAtt(v, "positive") == "down" || sn.rfind("sea_floor_depth", 0) == 0;
             if (sn != "altitude" && sn.rfind("sea_floor_depth", 0) != 0)
                 continue;
             mesh->z = Doubles(f, v, n, f.Name(v));
@@ -313,8 +319,9 @@ MeshReadResult ReadUgrid(const std::string& path) {
         const std::string facesName = f.TextAtt(topo, "face_node_connectivity");
         const int faces = f.Var(facesName);
         if (faces < 0)
-            throw Fail{topoName + ": face_node_connectivity " +
-                       (facesName.empty() ? std::string("missing") : facesName + " does not exist")};
+            throw Fail{
+                topoName + ": face_node_connectivity " +
+                (facesName.empty() ? std::string("missing") : facesName + " does not exist")};
         size_t rows = 0;
         const std::vector<int> table = Connectivity(f, faces, n, 0, facesName, rows);
         if (rows == 0)

@@ -9,7 +9,8 @@ CZoProjectionCombo::CZoProjectionCombo(QWidget* parent) : QComboBox(parent) {
     }
     m_registered = count();
     setMaxVisibleItems(20);
-    connect(this, &QComboBox::activated, this, [this](int) { emit projectionChosen(Projection()); });
+    connect(this, &QComboBox::activated, this,
+            [this](int) { emit projectionChosen(Projection()); });
 }
 
 void CZoProjectionCombo::SetProjection(const std::string& projection) {
@@ -20,10 +21,14 @@ void CZoProjectionCombo::SetProjection(const std::string& projection) {
     if (index < 0) {
         addItem(text);
         index = count() - 1;
-        setItemData(index, CZoMapProjection::IsKnown(projection) ? tr("EPSG code") : tr("Not a known projection"),
+        setItemData(index,
+                    CZoMapProjection::IsKnown(projection) ? tr("EPSG code")
+                                                          : tr("Not a known projection"),
                     Qt::ToolTipRole);
     }
     setCurrentIndex(index);
 }
 
-std::string CZoProjectionCombo::Projection() const { return currentText().toStdString(); }
+std::string CZoProjectionCombo::Projection() const {
+    return currentText().toStdString();
+}

@@ -27,10 +27,12 @@ class HostMaps : public ::testing::Test {
 protected:
     void SetUp() override {
         ASSERT_TRUE(m_dir.isValid());
-        QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope, m_dir.filePath("settings"));
+        QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope,
+                           m_dir.filePath("settings"));
         EditorSettings().clear();
         for (const char* name : {"estuary.setup", "estuary.2dm"})
-            ASSERT_TRUE(QFile::copy(QString(MUD_SOURCE_DIR "/examples/") + name, m_dir.filePath(name)));
+            ASSERT_TRUE(
+                QFile::copy(QString(MUD_SOURCE_DIR "/examples/") + name, m_dir.filePath(name)));
         m_window = std::make_unique<CEditorWindow>();
         m_window->SetPrompter([](const CEditorWindow::Prompt&) { return QMessageBox::Cancel; });
         m_window->resize(1280, 800);
@@ -104,7 +106,8 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
     const ZoOpenFileHook previous = ZoSetOpenFileHook(
         [&](QWidget*, const QString&, const QString&, const QString&) { return chosen; });
     QStringList messages;
-    const ZoMessageSink sink = ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    const ZoMessageSink sink =
+        ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
     QPushButton* browse = nullptr;
     for (QPushButton* b : m_window->CurrentDialog()->findChildren<QPushButton*>())
         if (b->text() == "Browse...")
@@ -122,7 +125,7 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
     chosen = m_dir.filePath("other.2dm");
     browse->click();
     EXPECT_EQ(messages.size(), 1);
-    EXPECT_EQ(domain->MeshFile(), "other.2dm");  // beside the setup: stored relative to it
+    EXPECT_EQ(domain->MeshFile(), "other.2dm"); // beside the setup: stored relative to it
     ASSERT_EQ(domain->BoundaryNames()->GetItemCount(), 1);
     EXPECT_EQ(domain->BoundaryNames()->GetItem(1)->Identifier(), "Harbour mouth");
     EXPECT_EQ(domain->GetMeshInfo().xMax, 501000.0);
@@ -142,7 +145,8 @@ TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
     CDomainKiv* domain = m_window->Document().GetDomain();
 
     QStringList messages;
-    const ZoMessageSink sink = ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    const ZoMessageSink sink =
+        ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
     auto type = [&](const QString& text) {
         combo->lineEdit()->setText(text);
         emit combo->lineEdit()->editingFinished();
@@ -164,4 +168,4 @@ TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
     EXPECT_EQ(combo->Projection(), "GK-3");
 }
 
-}  // namespace
+} // namespace
