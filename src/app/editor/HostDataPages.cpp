@@ -9,6 +9,8 @@
 #include "hydro/HDDensityKiv.h"
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
+#include "widgets/FemBase.h"
+#include "widgets/ZoFileSelectorDlg.h"
 #include "projection/ZoMapProjection.h"
 #include "widgets/GisNavigationDlg.h"
 #include "widgets/ZoProjectionCombo.h"
@@ -405,6 +407,30 @@ public:
         m_duration = new QLabel(this);
         f->addRow(tr("Duration"), m_duration);
 
+        // Not stored: a file to hold against the period while it is edited.
+        QFormLayout* d = Group(tr("Data files"));
+        d->addRow(new QLabel(tr("Data files that vary in time must cover the whole period."), this));
+        m_dataFile = new QLineEdit(this);
+        m_dataFile->setObjectName("dataFile");
+        auto* select = new QPushButton(tr("Select ..."), this);
+        select->setObjectName("selectDataFile");
+        m_viewDataFile = new QPushButton(tr("View ..."), this);
+        m_viewDataFile->setObjectName("viewDataFile");
+        auto* fileRow = new QHBoxLayout;
+        fileRow->addWidget(m_dataFile, 1);
+        fileRow->addWidget(select);
+        fileRow->addWidget(m_viewDataFile);
+        d->addRow(tr("Check a file"), fileRow);
+        m_dataFileCheck = new QLabel(this);
+        m_dataFileCheck->setObjectName("dataFileCheck");
+        m_dataFileCheck->setWordWrap(true);
+        d->addRow(m_dataFileCheck);
+        connect(m_dataFile, &QLineEdit::editingFinished, this, [this] { CheckDataFile(); });
+        connect(select, &QPushButton::clicked, this, [this] { SelectDataFile(); });
+        connect(m_viewDataFile, &QPushButton::clicked, this, [this] {
+            CFemBase::OpenDataFile(FileSelector().AbsolutePath(S(m_dataFile->text())), {}, this);
+        });
+
         connect(m_start, &QDateTimeEdit::editingFinished, this, [this] {
             const CString text = S(m_start->dateTime().toString(kTimeFormat));
             if (text != Node()->StartTime()) {
@@ -441,10 +467,53 @@ public:
         m_end->setText(start.isValid() && seconds >= 0 && seconds < 1e11
                            ? start.addSecs(whole).toString(kTimeFormat)
                            : QString("-"));
+        CheckDataFile();
     }
 
 private:
     CSimulationPeriodKiv* Node() const { return Section<CSimulationPeriodKiv>(); }
+    static constexpr const char* kDataFilter =
+        "Data files (*.qrd0;*.qrd1;*.qrd2;*.qrdu;*.kx0;*.kx2)|*.qrd0;*.qrd1;*.qrd2;*.qrdu;*.kx0;"
+        "*.kx2|All files (*.*)|*.*||";
+    // A selector with the period's time check, relative names against the setup's folder.
+    CZoFileSelector FileSelector() const {
+        CZoFileSelector s(Node());
+        s.SetFilter(kDataFilter);
+        Node()->SetUpQrdValidation_SimulationPeriod(s);
+        return s;
+    }
+    void CheckDataFile() {
+        const CString name = S(m_dataFile->text().trimmed());
+        const CZoFileSelector s = FileSelector();
+        const auto header = name.empty() ? nullptr : s.Header(name);
+        m_viewDataFile->setEnabled(header && header->header);
+        if (name.empty()) {
+            m_dataFileCheck->clear();
+            return;
+        }
+        CString error;
+        if (s.IsQrdFileValid(name, &error)) {
+            m_dataFileCheck->setStyleSheet("");
+            m_dataFileCheck->setText(tr("The file covers the period."));
+        } else {
+            m_dataFileCheck->setStyleSheet("color: #b00000");
+            m_dataFileCheck->setText(Q(error));
+        }
+    }
+    void SelectDataFile() {
+        CZoFileSelectorDlg dialog(S(m_dataFile->text().trimmed()), kDataFilter, "qrd0", this);
+        const CZoFileSelector s = FileSelector();
+        dialog.SetBaseFolder(s.BaseFolder());
+        Node()->SetUpQrdValidation_SimulationPeriod(dialog);
+        if (ZoRunFileSelector(dialog) != QDialog::Accepted)
+            return;
+        m_dataFile->setText(Q(dialog.FileName()));
+        CheckDataFile();
+    }
+
+    QLineEdit* m_dataFile = nullptr;
+    QPushButton* m_viewDataFile = nullptr;
+    QLabel* m_dataFileCheck = nullptr;
     QDateTimeEdit* m_start = nullptr;
     QLabel* m_startNote = nullptr;
     QSpinBox* m_steps = nullptr;
