@@ -11,6 +11,8 @@
 #include "widgets/ZoPrompts.h"
 
 #include <QFile>
+#include <QImage>
+#include <QProcess>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QTableWidget>
@@ -167,5 +169,26 @@ TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
     m_window->CurrentDialog()->SetData();
     EXPECT_EQ(combo->Projection(), "GK-3");
 }
+#ifdef MUDSETUP_EDITOR_EXE
+TEST(HostMapScreenshot, TheDomainPageShowsTheMesh) {
+    QTemporaryDir dir;
+    const QString png = dir.filePath("domain.png");
+    QProcess p;
+    p.start(MUDSETUP_EDITOR_EXE, {"--screenshot", png, "--select", "DOMAIN",
+                                  MUD_SOURCE_DIR "/examples/estuary.setup"});
+    ASSERT_TRUE(p.waitForFinished(120000));
+    ASSERT_EQ(p.exitCode(), 0) << p.readAllStandardError().toStdString();
+    const QImage image(png);
+    ASSERT_FALSE(image.isNull());
+    // The deep water of the estuary: the palette's dark blues, which no form shows.
+    int water = 0;
+    for (int y = 0; y < image.height(); ++y)
+        for (int x = 0; x < image.width(); ++x) {
+            const QColor c = image.pixelColor(x, y);
+            water += c.red() < 40 && c.green() < 110 && c.blue() > 80;
+        }
+    EXPECT_GT(water, 2000);
+}
+#endif
 
-} // namespace
+}  // namespace
