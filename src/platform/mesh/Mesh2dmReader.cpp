@@ -9,6 +9,7 @@
 // Other cards (MESHNAME, NUM_MATERIALS_PER_ELEM, BEGPARAMDEF, ...) are passed over.
 #include "MeshReader.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
@@ -68,25 +69,28 @@ bool ToDouble(std::string_view t, double& v) {
 // large ones.
 class NodeIds {
 public:
-    void Reserve(size_t n) { m_dense.reserve(n + 1); }
     bool Add(long long id, int index) {
-        if (id < static_cast<long long>(m_dense.size()) + (1 << 20) && m_sparse.empty()) {
+        ++m_count;
+        // The table never grows beyond a few entries a node, whatever ids a file uses.
+        if (!m_isSparse && static_cast<double>(id) < 4.0 * static_cast<double>(m_count) + 65536) {
             if (static_cast<size_t>(id) >= m_dense.size())
-                m_dense.resize(static_cast<size_t>(id) + 1, -1);
+                m_dense.resize(std::max(static_cast<size_t>(id) + 1, m_dense.size() * 3 / 2), -1);
             if (m_dense[static_cast<size_t>(id)] >= 0)
                 return false;
             m_dense[static_cast<size_t>(id)] = index;
             return true;
         }
-        if (m_sparse.empty())
+        if (!m_isSparse) {
             for (size_t i = 0; i < m_dense.size(); ++i)
                 if (m_dense[i] >= 0)
                     m_sparse.emplace(static_cast<long long>(i), m_dense[i]);
-        m_dense.clear();
+            m_dense = {};
+            m_isSparse = true;
+        }
         return m_sparse.emplace(id, index).second;
     }
     int Find(long long id) const {
-        if (!m_sparse.empty()) {
+        if (m_isSparse) {
             const auto it = m_sparse.find(id);
             return it == m_sparse.end() ? -1 : it->second;
         }
@@ -95,6 +99,8 @@ public:
     }
 
 private:
+    size_t m_count = 0;
+    bool m_isSparse = false;
     std::vector<int> m_dense;
     std::unordered_map<long long, int> m_sparse;
 };

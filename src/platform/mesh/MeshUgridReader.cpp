@@ -14,9 +14,14 @@
 #include <algorithm>
 #include <cmath>
 #include <map>
+#include <new>
 #include <sstream>
 
 namespace {
+
+// A dimension of a netCDF-4 file can claim far more than the file holds; nothing is
+// allocated beyond this (about 33 million nodes or elements).
+constexpr size_t kMaxCount = size_t(1) << 25;
 
 struct Fail {
     std::string message;
@@ -147,8 +152,8 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
                    (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) +
                    " a row"};
     rows = shape[0];
-    if (rows > (size_t(1) << 31) / shape[1])
-        throw Fail{what + " is too large"};
+    if (rows > kMaxCount)
+        throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
     std::vector<long long> raw(rows * shape[1]);
     if (!raw.empty())
         Check(nc_get_var_longlong(f.Id(), var, raw.data()), what);
@@ -297,8 +302,8 @@ MeshReadResult ReadUgrid(const std::string& path) {
         if (xShape.size() != 1 || xShape[0] == 0)
             throw Fail{"no nodes in " + coords[0]};
         const size_t n = xShape[0];
-        if (n >= static_cast<size_t>(INT32_MAX))
-            throw Fail{"too many nodes"};
+        if (n > kMaxCount)
+            throw Fail{"more nodes than can be read (" + std::to_string(n) + ")"};
         mesh->x = Doubles(f, xVar, n, coords[0]);
         mesh->y = Doubles(f, yVar, n, coords[1]);
         mesh->z.assign(n, 0.0);
@@ -335,5 +340,7 @@ MeshReadResult ReadUgrid(const std::string& path) {
         return {std::move(mesh), {}};
     } catch (const Fail& e) {
         return {nullptr, path + ": " + e.message};
+    } catch (const std::bad_alloc&) {
+        return {nullptr, path + ": too large to read"};
     }
 }

@@ -188,6 +188,24 @@ TEST(MeshUgrid, BadFilesGiveTheReason) {
     std::remove(path.c_str());
 }
 
+TEST(MeshUgrid, ADimensionFarBeyondTheFileIsRefusedNotAllocated) {
+    // netCDF-4 stores nothing for values never written: a small file can claim 2^31 nodes.
+    const std::string path = Temp("huge.nc");
+    int nc = 0, dim = 0, topo = 0, x = 0, y = 0;
+    ASSERT_EQ(nc_create(path.c_str(), NC_CLOBBER | NC_NETCDF4, &nc), NC_NOERR);
+    nc_def_dim(nc, "nodes", size_t(1) << 31, &dim);
+    nc_def_var(nc, "Mesh2", NC_INT, 0, nullptr, &topo);
+    nc_put_att_text(nc, topo, "cf_role", 13, "mesh_topology");
+    nc_put_att_text(nc, topo, "node_coordinates", 5, "nx ny");
+    nc_def_var(nc, "nx", NC_DOUBLE, 1, &dim, &x);
+    nc_def_var(nc, "ny", NC_DOUBLE, 1, &dim, &y);
+    ASSERT_EQ(nc_close(nc), NC_NOERR);
+    const MeshReadResult r = ReadMeshFile(path);
+    EXPECT_FALSE(r.mesh);
+    EXPECT_EQ(r.error, path + ": more nodes than can be read (2147483648)");
+    std::remove(path.c_str());
+}
+
 TEST(MeshIndex, FindsTheElementUnderAPointAndOnlyNearbyElements) {
     const MeshReadResult r = Read2dm(kGood, "good.2dm");
     ASSERT_TRUE(r.mesh);
