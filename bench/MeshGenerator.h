@@ -11,7 +11,7 @@ inline std::string GridMesh2dm(long elements) {
     const long side = std::max(2L, static_cast<long>(std::sqrt(elements / 2.0)) + 1);
     std::string out = "MESH2D\n";
     out.reserve(static_cast<size_t>(elements) * 60);
-    char line[128];
+    char line[256];
     long id = 0;
     for (long j = 0; j + 1 < side; ++j)
         for (long i = 0; i + 1 < side; ++i) {

@@ -25,14 +25,16 @@ void Frame(benchmark::State& state, double zoom) {
     view.FitToMesh();
     const MeshExtent& e = Mesh()->Extent();
     const double w = (e.xMax - e.xMin) * zoom;
-    view.SetViewRect(QRectF(e.xMin + (e.xMax - e.xMin) * 0.4, e.yMin + (e.yMax - e.yMin) * 0.4, w, w * 2 / 3));
+    view.SetViewRect(
+        QRectF(e.xMin + (e.xMax - e.xMin) * 0.4, e.yMin + (e.yMax - e.yMin) * 0.4, w, w * 2 / 3));
     const int overlay = view.AddOverlay("Points", Qt::red);
     for (int i = 0; i < 50; ++i)
-        view.AddPoint(overlay, i + 1, QString("P%1").arg(i), e.xMin + i * 100, e.yMin + i * 100, "UTM-32");
+        view.AddPoint(overlay, i + 1, QString("P%1").arg(i), e.xMin + i * 100, e.yMin + i * 100,
+                      "UTM-32");
     QImage image(view.size(), QImage::Format_ARGB32_Premultiplied);
     {
         QPainter warm(&image);
-        view.Render(warm);  // the image of the whole mesh is drawn once, on first need
+        view.Render(warm); // the image of the whole mesh is drawn once, on first need
     }
     int step = 0;
     for (auto _ : state) {
@@ -44,9 +46,15 @@ void Frame(benchmark::State& state, double zoom) {
     state.SetLabel(modes[static_cast<int>(view.LastMeshDraw())]);
 }
 
-void FullExtent(benchmark::State& s) { Frame(s, 1.0); }
-void QuarterWidth(benchmark::State& s) { Frame(s, 0.25); }
-void CloseZoom(benchmark::State& s) { Frame(s, 0.02); }
+void FullExtent(benchmark::State& s) {
+    Frame(s, 1.0);
+}
+void QuarterWidth(benchmark::State& s) {
+    Frame(s, 0.25);
+}
+void CloseZoom(benchmark::State& s) {
+    Frame(s, 0.02);
+}
 BENCHMARK(FullExtent)->Unit(benchmark::kMillisecond);
 BENCHMARK(QuarterWidth)->Unit(benchmark::kMillisecond);
 BENCHMARK(CloseZoom)->Unit(benchmark::kMillisecond);
@@ -64,7 +72,7 @@ void FirstFrameOnANewMesh(benchmark::State& state) {
 }
 BENCHMARK(FirstFrameOnANewMesh)->Unit(benchmark::kMillisecond)->Iterations(3);
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv) {
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))

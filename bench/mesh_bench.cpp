@@ -34,6 +34,6 @@ void BuildIndex(benchmark::State& state) {
 }
 BENCHMARK(BuildIndex)->Arg(10000)->Arg(1000000)->Unit(benchmark::kMillisecond);
 
-}  // namespace
+} // namespace
 
 BENCHMARK_MAIN();

@@ -3,13 +3,13 @@
 #include "mesh/MeshRaster.h"
 #include "mesh/MeshReader.h"
 
-#include <cstdint>
-#include <cstdio>
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
+#include <cstdio>
 #include <cstdlib>
-#include <vector>
 #include <string_view>
+#include <vector>
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const std::string_view text(reinterpret_cast<const char*>(data), size);

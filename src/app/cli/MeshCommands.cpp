@@ -39,7 +39,8 @@ int Info(const std::string& file) {
               << "x: " << Number(e.xMin) << " to " << Number(e.xMax) << "\n"
               << "y: " << Number(e.yMin) << " to " << Number(e.yMax) << "\n"
               << "z: " << Number(e.zMin) << " to " << Number(e.zMax) << "\n"
-              << "projection: " << (m.projection.empty() ? std::string("(not stated)") : m.projection) << "\n"
+              << "projection: "
+              << (m.projection.empty() ? std::string("(not stated)") : m.projection) << "\n"
               << "open boundaries: " << m.boundaries.size() << "\n";
     for (size_t i = 0; i < m.boundaries.size(); ++i) {
         const MeshBoundary& b = m.boundaries[i];
@@ -49,16 +50,21 @@ int Info(const std::string& file) {
     return FlushStdout() ? kExitOk : kExitError;
 }
 
-}  // namespace
+} // namespace
 
 void AddMeshCommands(CLI::App& app, int& status) {
     auto file = std::make_shared<std::string>();
     CLI::App* mesh = AddCommand(app, "mesh", kMeshHelp);
     mesh->require_subcommand(1);
     CLI::App* info = AddCommand(*mesh, "info", kMeshHelp);
-    info->add_option("FILE", *file)->required()->check(CLI::Validator(
-        [](std::string& v) { return v.empty() ? std::string("must not be empty") : std::string(); }, "FILE"));
+    info->add_option("FILE", *file)
+        ->required()
+        ->check(CLI::Validator(
+            [](std::string& v) {
+                return v.empty() ? std::string("must not be empty") : std::string();
+            },
+            "FILE"));
     info->callback([file, &status] { status = Info(*file); });
 }
 
-}  // namespace cli
+} // namespace cli

@@ -13,6 +13,7 @@
 #include "widgets/ZoFileSelectorDlg.h"
 #include "projection/ZoMapProjection.h"
 #include "widgets/GisNavigationDlg.h"
+#include "widgets/ZoProjectionCombo.h"
 #include "widgets/ZoPrompts.h"
 
 #include <QCheckBox>
@@ -182,12 +183,10 @@ public:
         fileRow->addWidget(m_file, 1);
         fileRow->addWidget(browse);
         mesh->addRow(tr("Mesh file"), fileRow);
-        m_projection = new QComboBox(this);
+        m_projection = new CZoProjectionCombo(this);
+        // An "EPSG:n" code can be typed.
         m_projection->setEditable(true);
-        for (const ProjectionEntry& e : CZoMapProjection::Entries()) {
-            m_projection->addItem(Q(e.name));
-            m_projection->setItemData(m_projection->count() - 1, Q(e.description), Qt::ToolTipRole);
-        }
+        m_projection->setInsertPolicy(QComboBox::NoInsert);
         mesh->addRow(tr("Projection"), m_projection);
 
         auto* extentBox = new QGroupBox(tr("Extent"), this);
@@ -314,7 +313,7 @@ public:
         if (!m_file->hasFocus())
             m_file->setText(Q(d->MeshFile()));
         if (!m_projection->lineEdit()->hasFocus())
-            m_projection->setCurrentText(Q(d->Projection()));
+            m_projection->SetProjection(d->Projection());
         for (auto& axis : m_extent)
             for (NumberEdit* e : axis) {
                 e->Show();
@@ -362,7 +361,7 @@ private:
     QLineEdit* m_file = nullptr;
     QLabel* m_counts = nullptr;
     CMeshNavigationDlg* m_map = nullptr;
-    QComboBox* m_projection = nullptr;
+    CZoProjectionCombo* m_projection = nullptr;
     NumberEdit* m_extent[3][2] = {};
     QCheckBox* m_threeD = nullptr;
     QComboBox* m_kind = nullptr;

@@ -15,8 +15,8 @@ struct MeshExtent {
 
 struct MeshBoundary {
     std::string name;
-    int code = 2;            // 1 is the land boundary; open boundaries count from 2
-    std::vector<int> nodes;  // node indices from 0, in order along the boundary
+    int code = 2;           // 1 is the land boundary; open boundaries count from 2
+    std::vector<int> nodes; // node indices from 0, in order along the boundary
 };
 
 class CMesh {

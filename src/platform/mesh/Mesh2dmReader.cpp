@@ -9,11 +9,12 @@
 // Other cards (MESHNAME, NUM_MATERIALS_PER_ELEM, BEGPARAMDEF, ...) are passed over.
 #include "MeshReader.h"
 
+#include <algorithm>
 #include <charconv>
-#include <cstdint>
-#include <optional>
 #include <cmath>
+#include <cstdint>
 #include <fstream>
+#include <optional>
 #include <sstream>
 #include <unordered_map>
 #include <unordered_set>
@@ -68,32 +69,38 @@ bool ToDouble(std::string_view t, double& v) {
 // large ones.
 class NodeIds {
 public:
-    void Reserve(size_t n) { m_dense.reserve(n + 1); }
     bool Add(long long id, int index) {
-        if (id < static_cast<long long>(m_dense.size()) + (1 << 20) && m_sparse.empty()) {
+        ++m_count;
+        // The table never grows beyond a few entries a node, whatever ids a file uses.
+        if (!m_isSparse && static_cast<double>(id) < 4.0 * static_cast<double>(m_count) + 65536) {
             if (static_cast<size_t>(id) >= m_dense.size())
-                m_dense.resize(static_cast<size_t>(id) + 1, -1);
+                m_dense.resize(std::max(static_cast<size_t>(id) + 1, m_dense.size() * 3 / 2), -1);
             if (m_dense[static_cast<size_t>(id)] >= 0)
                 return false;
             m_dense[static_cast<size_t>(id)] = index;
             return true;
         }
-        if (m_sparse.empty())
+        if (!m_isSparse) {
             for (size_t i = 0; i < m_dense.size(); ++i)
                 if (m_dense[i] >= 0)
                     m_sparse.emplace(static_cast<long long>(i), m_dense[i]);
-        m_dense.clear();
+            m_dense = {};
+            m_isSparse = true;
+        }
         return m_sparse.emplace(id, index).second;
     }
     int Find(long long id) const {
-        if (!m_sparse.empty()) {
+        if (m_isSparse) {
             const auto it = m_sparse.find(id);
             return it == m_sparse.end() ? -1 : it->second;
         }
-        return id > 0 && static_cast<size_t>(id) < m_dense.size() ? m_dense[static_cast<size_t>(id)] : -1;
+        return id > 0 && static_cast<size_t>(id) < m_dense.size() ? m_dense[static_cast<size_t>(id)]
+                                                                  : -1;
     }
 
 private:
+    size_t m_count = 0;
+    bool m_isSparse = false;
     std::vector<int> m_dense;
     std::unordered_map<long long, int> m_sparse;
 };
@@ -108,7 +115,7 @@ struct PendingString {
 
 struct Parser {
     CMesh& mesh;
-    std::vector<long long> elementIds;  // node ids, four per element (0 for none)
+    std::vector<long long> elementIds; // node ids, four per element (0 for none)
     std::vector<size_t> elementLines;
     std::vector<PendingString> strings;
     bool inString = false;
@@ -196,7 +203,8 @@ struct Parser {
             if (t.Next(tok)) {
                 long long code = 0;
                 if (!ToInt(tok, code) || code < INT32_MIN || code > INT32_MAX)
-                    return Error{line, "node string: code " + std::string(tok) + " is not a number"};
+                    return Error{line,
+                                 "node string: code " + std::string(tok) + " is not a number"};
                 ns.code = static_cast<int>(code);
                 ns.hasCode = true;
                 std::string_view name = t.Rest();
@@ -211,7 +219,8 @@ struct Parser {
 
     std::optional<Error> Finish() {
         if (inString)
-            return Error{strings.back().line, "node string not ended (its last node id must be negative)"};
+            return Error{strings.back().line,
+                         "node string not ended (its last node id must be negative)"};
         if (mesh.x.empty())
             return Error{0, "no nodes (ND)"};
         if (elementLines.empty())
@@ -252,7 +261,7 @@ struct Parser {
     }
 };
 
-}  // namespace
+} // namespace
 
 MeshReadResult Read2dm(std::string_view text, const std::string& fileName) {
     auto mesh = std::make_shared<CMesh>();
@@ -295,8 +304,9 @@ MeshReadResult ReadMeshFile(const std::string& path) {
         return {nullptr, path + ": cannot be opened"};
     char magic[4] = {};
     in.read(magic, 4);
-    if (in.gcount() == 4 && ((magic[0] == 'C' && magic[1] == 'D' && magic[2] == 'F') ||
-                             (magic[0] == '\x89' && magic[1] == 'H' && magic[2] == 'D' && magic[3] == 'F')))
+    if (in.gcount() == 4 &&
+        ((magic[0] == 'C' && magic[1] == 'D' && magic[2] == 'F') ||
+         (magic[0] == '\x89' && magic[1] == 'H' && magic[2] == 'D' && magic[3] == 'F')))
         return ReadUgrid(path);
     in.clear();
     in.seekg(0);

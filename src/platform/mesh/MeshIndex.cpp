@@ -13,7 +13,7 @@ void Box(const CMesh& m, const CMesh::Element& e, double& x0, double& y0, double
         y0 = std::min(y0, y), y1 = std::max(y1, y);
     }
 }
-}  // namespace
+} // namespace
 
 CMeshIndex::CMeshIndex(const CMesh& mesh) : m_mesh(mesh) {
     const MeshExtent& ext = mesh.Extent();
@@ -41,9 +41,12 @@ CMeshIndex::CMeshIndex(const CMesh& mesh) : m_mesh(mesh) {
         Box(mesh, mesh.elements[e], x0, y0, x1, y1);
         m_halfW = std::max(m_halfW, (x1 - x0) / 2);
         m_halfH = std::max(m_halfH, (y1 - y0) / 2);
-        const int c = static_cast<int>(std::clamp(((x0 + x1) / 2 - m_x0) / m_cell, 0.0, m_cols - 1.0));
-        const int r = static_cast<int>(std::clamp(((y0 + y1) / 2 - m_y0) / m_cell, 0.0, m_rows - 1.0));
-        cellOf[e] = static_cast<uint32_t>(r) * static_cast<uint32_t>(m_cols) + static_cast<uint32_t>(c);
+        const int c =
+            static_cast<int>(std::clamp(((x0 + x1) / 2 - m_x0) / m_cell, 0.0, m_cols - 1.0));
+        const int r =
+            static_cast<int>(std::clamp(((y0 + y1) / 2 - m_y0) / m_cell, 0.0, m_rows - 1.0));
+        cellOf[e] =
+            static_cast<uint32_t>(r) * static_cast<uint32_t>(m_cols) + static_cast<uint32_t>(c);
         ++m_start[cellOf[e] + 1];
     }
     for (size_t i = 1; i < m_start.size(); ++i)
@@ -76,7 +79,8 @@ size_t CMeshIndex::CountIn(double x0, double y0, double x1, double y1) const {
     size_t count = 0;
     for (int r = r0; r <= r1; ++r) {
         const size_t row = static_cast<size_t>(r) * static_cast<size_t>(m_cols);
-        count += m_start[row + static_cast<size_t>(c1) + 1] - m_start[row + static_cast<size_t>(c0)];
+        count +=
+            m_start[row + static_cast<size_t>(c1) + 1] - m_start[row + static_cast<size_t>(c0)];
     }
     return count;
 }
@@ -100,8 +104,10 @@ bool ElementContains(const CMesh& m, int element, double x, double y) {
         const double xj = m.x[static_cast<size_t>(e[j])], yj = m.y[static_cast<size_t>(e[j])];
         // On an edge counts as inside.
         const double cross = (xj - xi) * (y - yi) - (yj - yi) * (x - xi);
-        if (std::abs(cross) <= 1e-12 * (std::abs(xj - xi) + std::abs(yj - yi)) * (1 + std::abs(x) + std::abs(y)) &&
-            x >= std::min(xi, xj) && x <= std::max(xi, xj) && y >= std::min(yi, yj) && y <= std::max(yi, yj))
+        if (std::abs(cross) <=
+                1e-12 * (std::abs(xj - xi) + std::abs(yj - yi)) * (1 + std::abs(x) + std::abs(y)) &&
+            x >= std::min(xi, xj) && x <= std::max(xi, xj) && y >= std::min(yi, yj) &&
+            y <= std::max(yi, yj))
             return true;
         if ((yi > y) != (yj > y) && x < (xj - xi) * (y - yi) / (yj - yi) + xi)
             inside = !inside;

@@ -32,14 +32,15 @@ public:
     int ElementAt(double x, double y) const;
 
 private:
-    bool Cells(double x0, double y0, double x1, double y1, int& c0, int& r0, int& c1, int& r1) const;
+    bool Cells(double x0, double y0, double x1, double y1, int& c0, int& r0, int& c1,
+               int& r1) const;
 
     const CMesh& m_mesh;
     double m_x0 = 0, m_y0 = 0, m_cell = 1;
     int m_cols = 1, m_rows = 1;
     double m_halfW = 0, m_halfH = 0;
-    std::vector<uint32_t> m_start;  // per cell, the first of its items; one more at the end
-    std::vector<uint32_t> m_items;  // element indices, cell by cell
+    std::vector<uint32_t> m_start; // per cell, the first of its items; one more at the end
+    std::vector<uint32_t> m_items; // element indices, cell by cell
 };
 
 // Whether the point lies in the element (its edges included).

@@ -9,7 +9,8 @@ uint32_t BedLevelColour(double z, double zMin, double zMax) {
         int r, g, b;
     };
     // Deep blue through light blue to the waterline, then green to brown on land.
-    static const Stop water[] = {{0, 8, 29, 88}, {0.5, 34, 94, 168}, {0.8, 65, 182, 196}, {1, 199, 233, 180}};
+    static const Stop water[] = {
+        {0, 8, 29, 88}, {0.5, 34, 94, 168}, {0.8, 65, 182, 196}, {1, 199, 233, 180}};
     static const Stop land[] = {{0, 120, 180, 90}, {1, 140, 100, 60}};
     const Stop* s;
     size_t n;
@@ -28,7 +29,9 @@ uint32_t BedLevelColour(double z, double zMin, double zMax) {
     while (i + 2 < n && t > s[i + 1].t)
         ++i;
     const double f = s[i + 1].t > s[i].t ? (t - s[i].t) / (s[i + 1].t - s[i].t) : 0;
-    const auto mix = [f](int a, int b) { return static_cast<uint32_t>(std::lround(a + (b - a) * f)); };
+    const auto mix = [f](int a, int b) {
+        return static_cast<uint32_t>(std::lround(a + (b - a) * f));
+    };
     return 0xff000000u | mix(s[i].r, s[i + 1].r) << 16 | mix(s[i].g, s[i + 1].g) << 8 |
            mix(s[i].b, s[i + 1].b);
 }
@@ -57,14 +60,16 @@ int Clamp(double v, int lo, int hi) {
 }
 
 // Fills the pixel centres inside the triangle (pixel coordinates), either orientation.
-void FillTriangle(double ax, double ay, double bx, double by, double cx, double cy,
-                  uint32_t colour, const RasterView& v, uint32_t* buf) {
+void FillTriangle(double ax, double ay, double bx, double by, double cx, double cy, uint32_t colour,
+                  const RasterView& v, uint32_t* buf) {
     const double area = (bx - ax) * (cy - ay) - (by - ay) * (cx - ax);
     if (area == 0)
         return;
     const double sign = area > 0 ? 1 : -1;
-    const double left = std::ceil(std::min({ax, bx, cx}) - 0.5), right = std::floor(std::max({ax, bx, cx}) - 0.5);
-    const double top = std::ceil(std::min({ay, by, cy}) - 0.5), bottom = std::floor(std::max({ay, by, cy}) - 0.5);
+    const double left = std::ceil(std::min({ax, bx, cx}) - 0.5),
+                 right = std::floor(std::max({ax, bx, cx}) - 0.5);
+    const double top = std::ceil(std::min({ay, by, cy}) - 0.5),
+                 bottom = std::floor(std::max({ay, by, cy}) - 0.5);
     if (!(right >= 0 && left < v.width && bottom >= 0 && top < v.height))
         return;
     const int x0 = Clamp(left, 0, v.width - 1), x1 = Clamp(right, 0, v.width - 1);
@@ -83,7 +88,7 @@ void FillTriangle(double ax, double ay, double bx, double by, double cx, double 
                     empty = true;
                 continue;
             }
-            const double px = e[0] + k / dy;  // where the edge crosses the row
+            const double px = e[0] + k / dy; // where the edge crosses the row
             if (dy > 0)
                 hi = std::min(hi, px);
             else
@@ -99,7 +104,7 @@ void FillTriangle(double ax, double ay, double bx, double by, double cx, double 
     }
 }
 
-}  // namespace
+} // namespace
 
 void RasteriseMesh(const CMeshIndex& index, const std::vector<uint32_t>& colours,
                    const RasterView& v, uint32_t* buf) {
@@ -122,6 +127,7 @@ void RasteriseMesh(const CMeshIndex& index, const std::vector<uint32_t>& colours
             FillTriangle(px[0], py[0], px[2], py[2], px[3], py[3], c, v, buf);
         const double cx = std::floor(sx / n), cy = std::floor(sy / n);
         if (cx >= 0 && cx < v.width && cy >= 0 && cy < v.height)
-            buf[static_cast<size_t>(cy) * static_cast<size_t>(v.width) + static_cast<size_t>(cx)] = c;
+            buf[static_cast<size_t>(cy) * static_cast<size_t>(v.width) + static_cast<size_t>(cx)] =
+                c;
     });
 }

@@ -13,8 +13,8 @@ uint32_t BedLevelColour(double z, double zMin, double zMax);
 std::vector<uint32_t> ElementColours(const CMesh& mesh);
 
 struct RasterView {
-    double xLeft = 0, yTop = 0;  // world coordinates of the top left corner of the buffer
-    double pixel = 1;            // world units per pixel
+    double xLeft = 0, yTop = 0; // world coordinates of the top left corner of the buffer
+    double pixel = 1;           // world units per pixel
     int width = 0, height = 0;
 };
 

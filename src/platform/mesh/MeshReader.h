@@ -8,8 +8,8 @@
 #include <string_view>
 
 struct MeshReadResult {
-    MeshPtr mesh;       // null when error is set
-    std::string error;  // "FILE:LINE: message" for text files, "FILE: message" for netCDF
+    MeshPtr mesh;      // null when error is set
+    std::string error; // "FILE:LINE: message" for text files, "FILE: message" for netCDF
 };
 
 // By content: netCDF (classic, 64-bit offset or HDF5-based) is read as UGRID, anything else

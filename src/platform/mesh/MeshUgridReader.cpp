@@ -14,9 +14,14 @@
 #include <algorithm>
 #include <cmath>
 #include <map>
+#include <new>
 #include <sstream>
 
 namespace {
+
+// A dimension of a netCDF-4 file can claim far more than the file holds; nothing is
+// allocated beyond this (about 33 million nodes or elements).
+constexpr size_t kMaxCount = size_t(1) << 25;
 
 struct Fail {
     std::string message;
@@ -37,7 +42,8 @@ public:
     std::string TextAtt(int var, const char* name) const {
         nc_type type;
         size_t len = 0;
-        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type != NC_CHAR || len > (1 << 20))
+        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type != NC_CHAR ||
+            len > (1 << 20))
             return {};
         std::string s(len, '\0');
         if (nc_get_att_text(m_id, var, name, s.data()) != NC_NOERR)
@@ -132,7 +138,8 @@ int TopologyVariable(const File& f) {
             if (dim == 2)
                 return v;
         }
-    throw Fail{"no variable with cf_role = \"mesh_topology\" and topology_dimension 2 (not a UGRID mesh)"};
+    throw Fail{
+        "no variable with cf_role = \"mesh_topology\" and topology_dimension 2 (not a UGRID mesh)"};
 }
 
 // Node indices from 0 in an edge or face table, with the fill value as -1.
@@ -141,10 +148,12 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
     const std::vector<size_t> shape = f.Shape(var);
     if (shape.size() != 2 || (columns && shape[1] != columns) || shape[1] < 3 - (columns == 2) ||
         shape[1] > 4)
-        throw Fail{what + " must have " + (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) + " a row"};
+        throw Fail{what + " must have " +
+                   (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) +
+                   " a row"};
     rows = shape[0];
-    if (rows > (size_t(1) << 31) / shape[1])
-        throw Fail{what + " is too large"};
+    if (rows > kMaxCount)
+        throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
     std::vector<long long> raw(rows * shape[1]);
     if (!raw.empty())
         Check(nc_get_var_longlong(f.Id(), var, raw.data()), what);
@@ -272,7 +281,7 @@ std::string Projection(const File& f, int xVar) {
                                         : std::string();
 }
 
-}  // namespace
+} // namespace
 
 MeshReadResult ReadUgrid(const std::string& path) {
     File f(path);
@@ -287,13 +296,14 @@ MeshReadResult ReadUgrid(const std::string& path) {
             throw Fail{topoName + ": node_coordinates must name two variables"};
         const int xVar = f.Var(coords[0]), yVar = f.Var(coords[1]);
         if (xVar < 0 || yVar < 0)
-            throw Fail{topoName + ": node coordinate " + coords[xVar < 0 ? 0 : 1] + " does not exist"};
+            throw Fail{topoName + ": node coordinate " + coords[xVar < 0 ? 0 : 1] +
+                       " does not exist"};
         const std::vector<size_t> xShape = f.Shape(xVar);
         if (xShape.size() != 1 || xShape[0] == 0)
             throw Fail{"no nodes in " + coords[0]};
         const size_t n = xShape[0];
-        if (n >= static_cast<size_t>(INT32_MAX))
-            throw Fail{"too many nodes"};
+        if (n > kMaxCount)
+            throw Fail{"more nodes than can be read (" + std::to_string(n) + ")"};
         mesh->x = Doubles(f, xVar, n, coords[0]);
         mesh->y = Doubles(f, yVar, n, coords[1]);
         mesh->z.assign(n, 0.0);
@@ -301,7 +311,8 @@ MeshReadResult ReadUgrid(const std::string& path) {
             if (f.TextAtt(v, "mesh") != topoName || f.TextAtt(v, "location") != "node")
                 continue;
             const std::string sn = f.TextAtt(v, "standard_name");
-            const bool down = f.TextAtt(v, "positive") == "down" || sn.rfind("sea_floor_depth", 0) == 0;
+            const bool down =
+                f.TextAtt(v, "positive") == "down" || sn.rfind("sea_floor_depth", 0) == 0;
             if (sn != "altitude" && sn.rfind("sea_floor_depth", 0) != 0)
                 continue;
             mesh->z = Doubles(f, v, n, f.Name(v));
@@ -313,8 +324,9 @@ MeshReadResult ReadUgrid(const std::string& path) {
         const std::string facesName = f.TextAtt(topo, "face_node_connectivity");
         const int faces = f.Var(facesName);
         if (faces < 0)
-            throw Fail{topoName + ": face_node_connectivity " +
-                       (facesName.empty() ? std::string("missing") : facesName + " does not exist")};
+            throw Fail{
+                topoName + ": face_node_connectivity " +
+                (facesName.empty() ? std::string("missing") : facesName + " does not exist")};
         size_t rows = 0;
         const std::vector<int> table = Connectivity(f, faces, n, 0, facesName, rows);
         if (rows == 0)
@@ -328,5 +340,7 @@ MeshReadResult ReadUgrid(const std::string& path) {
         return {std::move(mesh), {}};
     } catch (const Fail& e) {
         return {nullptr, path + ": " + e.message};
+    } catch (const std::bad_alloc&) {
+        return {nullptr, path + ": too large to read"};
     }
 }

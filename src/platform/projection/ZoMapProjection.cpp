@@ -49,11 +49,11 @@ int EpsgOf(const std::string& s) {
 struct Context {
     PJ_CONTEXT* ctx = [] {
         PJ_CONTEXT* c = proj_context_create();
-        proj_log_level(c, PJ_LOG_NONE);  // failures are reported as results
+        proj_log_level(c, PJ_LOG_NONE); // failures are reported as results
         return c;
     }();
-    std::map<int, bool> known;         // EPSG code -> PROJ knows it
-    std::map<int, bool> geographical;  // EPSG code -> angular coordinates
+    std::map<int, bool> known;        // EPSG code -> PROJ knows it
+    std::map<int, bool> geographical; // EPSG code -> angular coordinates
     ~Context() { proj_context_destroy(ctx); }
 };
 Context& Ctx() {
@@ -86,7 +86,7 @@ bool Describe(int epsg, bool* geographical) {
     return crs != nullptr;
 }
 
-}  // namespace
+} // namespace
 
 const std::vector<ProjectionEntry>& CZoMapProjection::Entries() {
     static const std::vector<ProjectionEntry> entries = MakeEntries();

@@ -11,8 +11,8 @@
 
 struct ProjectionEntry {
     int id;
-    std::string name;         // the projection string stored in setups
-    std::string description;  // shown beside it in drop-down lists
+    std::string name;        // the projection string stored in setups
+    std::string description; // shown beside it in drop-down lists
     int epsg;
 };
 
@@ -51,6 +51,6 @@ public:
 
 private:
     bool m_identity = false;
-    void* m_pj = nullptr;  // PJ*, kept out of the header
+    void* m_pj = nullptr; // PJ*, kept out of the header
     std::string m_error;
 };

@@ -11,9 +11,13 @@
 #include <QVBoxLayout>
 
 namespace {
-QString Q(const CString& s) { return QString::fromStdString(s); }
-QString Number(double v) { return QString::number(v, 'f', std::abs(v) < 1000 ? 5 : 1); }
-}  // namespace
+QString Q(const CString& s) {
+    return QString::fromStdString(s);
+}
+QString Number(double v) {
+    return QString::number(v, 'f', std::abs(v) < 1000 ? 5 : 1);
+}
+} // namespace
 
 CGisNavigationDlg::CGisNavigationDlg() {
     auto* layout = new QVBoxLayout(this);

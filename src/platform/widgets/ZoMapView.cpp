@@ -26,7 +26,7 @@ double SegmentDistance(QPointF p, QPointF a, QPointF b) {
     const QPointF q = a + t * d - p;
     return std::hypot(q.x(), q.y());
 }
-}  // namespace
+} // namespace
 
 CZoMapView::CZoMapView(QWidget* parent) : QWidget(parent) {
     setMouseTracking(true);
@@ -103,13 +103,15 @@ bool CZoMapView::AddPoint(int overlay, int number, const QString& name, double x
 bool CZoMapView::AddPolyline(int overlay, int number, const QString& name,
                              const std::vector<double>& x, const std::vector<double>& y,
                              const std::string& projection) {
-    return x.size() >= 2 && AddFeature(overlay, CZoMapFeature::kPolyline, number, name, x, y, projection);
+    return x.size() >= 2 &&
+           AddFeature(overlay, CZoMapFeature::kPolyline, number, name, x, y, projection);
 }
 
 bool CZoMapView::AddPolygon(int overlay, int number, const QString& name,
                             const std::vector<double>& x, const std::vector<double>& y,
                             const std::string& projection) {
-    return x.size() >= 3 && AddFeature(overlay, CZoMapFeature::kPolygon, number, name, x, y, projection);
+    return x.size() >= 3 &&
+           AddFeature(overlay, CZoMapFeature::kPolygon, number, name, x, y, projection);
 }
 
 std::vector<CZoMapHit> CZoMapView::HitTest(QPointF pixel, double tolerance) const {
@@ -133,7 +135,8 @@ std::vector<CZoMapHit> CZoMapView::HitTest(QPointF pixel, double tolerance) cons
                 const int n = static_cast<int>(px.size());
                 const int segments = f.kind == CZoMapFeature::kPolygon ? n : n - 1;
                 for (int s = 0; s < segments && !hit; ++s)
-                    hit = SegmentDistance(pixel, px[s], px[(s + 1) % n]) <= tolerance + layer.lineWidth / 2;
+                    hit = SegmentDistance(pixel, px[s], px[(s + 1) % n]) <=
+                          tolerance + layer.lineWidth / 2;
             }
             if (hit)
                 hits.push_back({o, static_cast<int>(i)});
@@ -177,7 +180,8 @@ QRectF CZoMapView::ViewRect() const {
 }
 
 void CZoMapView::SetViewRect(const QRectF& rect) {
-    if (rect.isNull() || !rect.isValid() || !std::isfinite(rect.width()) || !std::isfinite(rect.height())) {
+    if (rect.isNull() || !rect.isValid() || !std::isfinite(rect.width()) ||
+        !std::isfinite(rect.height())) {
         m_pending = QRectF();
         m_fitPending = true;
         if (width() > 0 && height() > 0)
@@ -222,7 +226,8 @@ QPointF CZoMapView::ToPixel(double x, double y) const {
 
 QPointF CZoMapView::ToWorld(QPointF p) const {
     const double s = m_scale > 0 ? m_scale : 1;
-    return {m_centre.x() + (p.x() - width() / 2.0) * s, m_centre.y() - (p.y() - height() / 2.0) * s};
+    return {m_centre.x() + (p.x() - width() / 2.0) * s,
+            m_centre.y() - (p.y() - height() / 2.0) * s};
 }
 
 void CZoMapView::ZoomBy(double factor, QPointF around) {
@@ -271,7 +276,8 @@ void CZoMapView::Render(QPainter& p) {
     DrawLegend(p);
     if (!m_message.isEmpty()) {
         p.setPen(QColor(90, 90, 90));
-        p.drawText(rect().adjusted(12, 12, -12, -12), Qt::AlignCenter | Qt::TextWordWrap, m_message);
+        p.drawText(rect().adjusted(12, 12, -12, -12), Qt::AlignCenter | Qt::TextWordWrap,
+                   m_message);
     }
 }
 
@@ -306,7 +312,8 @@ void CZoMapView::DrawMesh(QPainter& p) {
             const QRectF source((shown.left() - e.xMin) / m_overviewPixel,
                                 (e.yMax - shown.bottom()) / m_overviewPixel,
                                 shown.width() / m_overviewPixel, shown.height() / m_overviewPixel);
-            const QRectF target(ToPixel(shown.left(), shown.bottom()), ToPixel(shown.right(), shown.top()));
+            const QRectF target(ToPixel(shown.left(), shown.bottom()),
+                                ToPixel(shown.right(), shown.top()));
             p.drawImage(target, m_overview, source);
         }
         m_lastDraw = MeshDraw::kOverview;
@@ -360,9 +367,11 @@ void CZoMapView::DrawLegend(QPainter& p) {
     const MeshExtent& e = m_mesh->Extent();
     const int barH = std::min(100, height() / 3), barW = 12;
     const QFontMetrics fm = p.fontMetrics();
-    const QString top = QString::number(e.zMax, 'f', 1) + " m", bottom = QString::number(e.zMin, 'f', 1) + " m";
+    const QString top = QString::number(e.zMax, 'f', 1) + " m",
+                  bottom = QString::number(e.zMin, 'f', 1) + " m";
     const QString title = tr("Bed level");
-    const int textW = std::max({fm.horizontalAdvance(top), fm.horizontalAdvance(bottom), fm.horizontalAdvance(title)});
+    const int textW = std::max(
+        {fm.horizontalAdvance(top), fm.horizontalAdvance(bottom), fm.horizontalAdvance(title)});
     const QRect box(width() - textW - barW - 28, height() - barH - fm.height() - 26,
                     textW + barW + 20, barH + fm.height() + 18);
     p.save();
@@ -392,11 +401,14 @@ void CZoMapView::DrawOverlays(QPainter& p) {
             QPolygonF px;
             for (const QPointF& w : f.points)
                 px << ToPixel(w.x(), w.y());
-            if (!QRectF(rect()).adjusted(-50, -50, 50, 50).intersects(px.boundingRect().adjusted(-1, -1, 1, 1)))
+            if (!QRectF(rect())
+                     .adjusted(-50, -50, 50, 50)
+                     .intersects(px.boundingRect().adjusted(-1, -1, 1, 1)))
                 continue;
             const double width = o.lineWidth + (selected ? 3 : 0);
             if (selected) {
-                p.setPen(QPen(QColor(255, 215, 0), width + 4, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+                p.setPen(QPen(QColor(255, 215, 0), width + 4, Qt::SolidLine, Qt::RoundCap,
+                              Qt::RoundJoin));
                 p.setBrush(Qt::NoBrush);
                 if (f.kind == CZoMapFeature::kPoint)
                     p.drawEllipse(px[0], o.pointSize / 2 + 4, o.pointSize / 2 + 4);

@@ -23,10 +23,10 @@ class CMeshIndex;
 struct CZoMapFeature {
     enum Kind { kPoint, kPolyline, kPolygon };
     Kind kind = kPoint;
-    int number = 0;    // the feature's number in its layer, from 1
-    int subIndex = 0;  // a part of what the feature stands for; 0 for the whole
+    int number = 0;   // the feature's number in its layer, from 1
+    int subIndex = 0; // a part of what the feature stands for; 0 for the whole
     QString name;
-    QPolygonF points;  // in the map's projection
+    QPolygonF points; // in the map's projection
 };
 
 struct CZoMapOverlay {
@@ -37,7 +37,7 @@ struct CZoMapOverlay {
     bool visible = true;
     bool labels = true;
     std::vector<CZoMapFeature> features;
-    int selected = 0;  // number of the highlighted feature, 0 for none
+    int selected = 0; // number of the highlighted feature, 0 for none
 };
 
 // A feature found by a hit test: its layer and its place in the layer's list.
@@ -65,7 +65,9 @@ public:
     int AddOverlay(const QString& name, const QColor& colour);
     int OverlayCount() const { return static_cast<int>(m_overlays.size()); }
     CZoMapOverlay& Overlay(int overlay) { return m_overlays.at(static_cast<size_t>(overlay)); }
-    const CZoMapOverlay& Overlay(int overlay) const { return m_overlays.at(static_cast<size_t>(overlay)); }
+    const CZoMapOverlay& Overlay(int overlay) const {
+        return m_overlays.at(static_cast<size_t>(overlay));
+    }
     void RemoveOverlays();
     // Features in a registered projection, transformed to the map's. False, and nothing
     // added, when the projection is unknown or a point cannot be transformed.
@@ -128,20 +130,20 @@ private:
     MeshPtr m_mesh;
     std::unique_ptr<CMeshIndex> m_index;
     std::vector<uint32_t> m_colours;
-    QImage m_overview;  // the whole mesh, drawn once
+    QImage m_overview; // the whole mesh, drawn once
     double m_overviewPixel = 0;
-    QImage m_raster;    // the view, drawn again when the view changes
+    QImage m_raster; // the view, drawn again when the view changes
     QPointF m_rasterCentre;
     double m_rasterScale = 0;
     std::string m_projection = "UTM-32";
     QString m_message;
     std::vector<CZoMapOverlay> m_overlays;
 
-    QPointF m_centre;     // world point at the middle of the widget
-    double m_scale = 0;   // world units per pixel; 0 until the view is set
-    QRectF m_pending;     // a rectangle set before the widget had a size
+    QPointF m_centre;   // world point at the middle of the widget
+    double m_scale = 0; // world units per pixel; 0 until the view is set
+    QRectF m_pending;   // a rectangle set before the widget had a size
     bool m_fitPending = true;
-    bool m_fitted = false;  // fitted to the mesh and not moved since
+    bool m_fitted = false; // fitted to the mesh and not moved since
     QPoint m_pressPos, m_lastPos;
     bool m_pressed = false, m_dragging = false;
     MeshDraw m_lastDraw = MeshDraw::kNone;

@@ -39,10 +39,13 @@ TEST(MeshCli, InfoOfTheExampleMesh) {
     EXPECT_EQ(r.exitCode, 0) << r.err;
     EXPECT_EQ(r.err, "");
     EXPECT_NE(r.out.find("nodes: 2202\nelements: 3496 (2920 triangles, 576 quadrilaterals)\n"),
-              std::string::npos) << r.out;
-    EXPECT_NE(r.out.find("open boundaries: 3\n  1: \"Sea boundary\", code 2, 17 nodes\n"
-                         "  2: \"River Elbe\", code 3, 17 nodes\n  3: \"River Oste\", code 4, 5 nodes\n"),
-              std::string::npos) << r.out;
+              std::string::npos)
+        << r.out;
+    EXPECT_NE(
+        r.out.find("open boundaries: 3\n  1: \"Sea boundary\", code 2, 17 nodes\n"
+                   "  2: \"River Elbe\", code 3, 17 nodes\n  3: \"River Oste\", code 4, 5 nodes\n"),
+        std::string::npos)
+        << r.out;
 }
 
 TEST(MeshCli, InfoOfAUgridFile) {
@@ -55,7 +58,9 @@ TEST(MeshCli, InfoOfAUgridFile) {
     ASSERT_TRUE(testsupport::WriteUgrid(path, s));
     const Result r = Mudsetup("mesh info " + path);
     EXPECT_EQ(r.exitCode, 0) << r.err;
-    EXPECT_NE(r.out.find("elements: 2 (2 triangles, 0 quadrilaterals)\nx: 0 to 10\n"), std::string::npos) << r.out;
+    EXPECT_NE(r.out.find("elements: 2 (2 triangles, 0 quadrilaterals)\nx: 0 to 10\n"),
+              std::string::npos)
+        << r.out;
     EXPECT_NE(r.out.find("projection: LONG/LAT\nopen boundaries: 0\n"), std::string::npos) << r.out;
     fs::remove(path);
 }
@@ -76,4 +81,4 @@ TEST(MeshCli, AFileThatCannotBeReadExitsTwoWithThePlace) {
     EXPECT_NE(r.out.find("usage: mudsetup mesh info FILE"), std::string::npos);
 }
 
-}  // namespace
+} // namespace

@@ -5,10 +5,15 @@
 #include "EditorWindow.h"
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/DomainKiv.h"
+#include "projection/ZoMapProjection.h"
 #include "widgets/GisNavigationDlg.h"
+#include "widgets/ZoProjectionCombo.h"
 #include "widgets/ZoPrompts.h"
 
 #include <QFile>
+#include <QImage>
+#include <QProcess>
+#include <QLineEdit>
 #include <QPushButton>
 #include <QTableWidget>
 #include <QTemporaryDir>
@@ -24,10 +29,12 @@ class HostMaps : public ::testing::Test {
 protected:
     void SetUp() override {
         ASSERT_TRUE(m_dir.isValid());
-        QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope, m_dir.filePath("settings"));
+        QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope,
+                           m_dir.filePath("settings"));
         EditorSettings().clear();
         for (const char* name : {"estuary.setup", "estuary.2dm"})
-            ASSERT_TRUE(QFile::copy(QString(MUD_SOURCE_DIR "/examples/") + name, m_dir.filePath(name)));
+            ASSERT_TRUE(
+                QFile::copy(QString(MUD_SOURCE_DIR "/examples/") + name, m_dir.filePath(name)));
         m_window = std::make_unique<CEditorWindow>();
         m_window->SetPrompter([](const CEditorWindow::Prompt&) { return QMessageBox::Cancel; });
         m_window->resize(1280, 800);
@@ -101,7 +108,8 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
     const ZoOpenFileHook previous = ZoSetOpenFileHook(
         [&](QWidget*, const QString&, const QString&, const QString&) { return chosen; });
     QStringList messages;
-    const ZoMessageSink sink = ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    const ZoMessageSink sink =
+        ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
     QPushButton* browse = nullptr;
     for (QPushButton* b : m_window->CurrentDialog()->findChildren<QPushButton*>())
         if (b->text() == "Browse...")
@@ -119,7 +127,7 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
     chosen = m_dir.filePath("other.2dm");
     browse->click();
     EXPECT_EQ(messages.size(), 1);
-    EXPECT_EQ(domain->MeshFile(), "other.2dm");  // beside the setup: stored relative to it
+    EXPECT_EQ(domain->MeshFile(), "other.2dm"); // beside the setup: stored relative to it
     ASSERT_EQ(domain->BoundaryNames()->GetItemCount(), 1);
     EXPECT_EQ(domain->BoundaryNames()->GetItem(1)->Identifier(), "Harbour mouth");
     EXPECT_EQ(domain->GetMeshInfo().xMax, 501000.0);
@@ -129,5 +137,58 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
     ZoSetOpenFileHook(previous);
     ZoSetMessageSink(sink);
 }
+
+TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN"));
+    auto* combo = m_window->CurrentDialog()->findChild<CZoProjectionCombo*>();
+    ASSERT_NE(combo, nullptr);
+    EXPECT_EQ(combo->count(), static_cast<int>(CZoMapProjection::Entries().size()));
+    EXPECT_EQ(combo->Projection(), "UTM-32");
+    CDomainKiv* domain = m_window->Document().GetDomain();
+
+    QStringList messages;
+    const ZoMessageSink sink =
+        ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    auto type = [&](const QString& text) {
+        combo->lineEdit()->setText(text);
+        emit combo->lineEdit()->editingFinished();
+    };
+    type("EPSG:25832");
+    EXPECT_EQ(domain->Projection(), "EPSG:25832");
+    type("MERCATOR");
+    EXPECT_EQ(domain->Projection(), "EPSG:25832");
+    ASSERT_EQ(messages.size(), 1);
+    EXPECT_EQ(messages[0], "\"MERCATOR\" is not a known projection.");
+    combo->setCurrentIndex(combo->findText("UTM-33"));
+    emit combo->activated(combo->currentIndex());
+    EXPECT_EQ(domain->Projection(), "UTM-33");
+    ZoSetMessageSink(sink);
+
+    // A stored string the registry does not list is shown as it is.
+    domain->Projection("GK-3");
+    m_window->CurrentDialog()->SetData();
+    EXPECT_EQ(combo->Projection(), "GK-3");
+}
+#ifdef MUDSETUP_EDITOR_EXE
+TEST(HostMapScreenshot, TheDomainPageShowsTheMesh) {
+    QTemporaryDir dir;
+    const QString png = dir.filePath("domain.png");
+    QProcess p;
+    p.start(MUDSETUP_EDITOR_EXE, {"--screenshot", png, "--select", "DOMAIN",
+                                  MUD_SOURCE_DIR "/examples/estuary.setup"});
+    ASSERT_TRUE(p.waitForFinished(120000));
+    ASSERT_EQ(p.exitCode(), 0) << p.readAllStandardError().toStdString();
+    const QImage image(png);
+    ASSERT_FALSE(image.isNull());
+    // The deep water of the estuary: the palette's dark blues, which no form shows.
+    int water = 0;
+    for (int y = 0; y < image.height(); ++y)
+        for (int x = 0; x < image.width(); ++x) {
+            const QColor c = image.pixelColor(x, y);
+            water += c.red() < 40 && c.green() < 110 && c.blue() > 80;
+        }
+    EXPECT_GT(water, 2000);
+}
+#endif
 
 }  // namespace

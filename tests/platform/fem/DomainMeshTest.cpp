@@ -12,7 +12,8 @@
 namespace {
 
 std::string WriteFile(const std::string& name, const std::string& text) {
-    const std::string path = (std::filesystem::temp_directory_path() / ("muddomain_" + name)).string();
+    const std::string path =
+        (std::filesystem::temp_directory_path() / ("muddomain_" + name)).string();
     std::ofstream(path) << text;
     return path;
 }
@@ -79,7 +80,8 @@ TEST(DomainMesh, TakesEverythingFromTheMeshAndTheListsFollow) {
 
     // What the mesh gave is saved with the setup.
     auto saved = testsupport::Saved(*doc);
-    const paramfile::Section* s = testsupport::Find(*saved, {"DOMAIN", "BOUNDARY_NAMES", "BOUNDARY_2"});
+    const paramfile::Section* s =
+        testsupport::Find(*saved, {"DOMAIN", "BOUNDARY_NAMES", "BOUNDARY_2"});
     ASSERT_NE(s, nullptr);
     EXPECT_EQ(testsupport::String(*s, "name"), "River");
     std::remove(path.c_str());
@@ -108,7 +110,7 @@ TEST(DomainMesh, TheGeometryOfAStoredMeshIsReadOnceAndKeepsTheStoredData) {
     const std::string path = WriteFile("good.2dm", kMesh);
     const MeshPtr mesh = d->EnsureMesh(path, &error);
     ASSERT_TRUE(mesh) << error;
-    EXPECT_EQ(d->EnsureMesh(path, &error), mesh);  // shared, not read again
+    EXPECT_EQ(d->EnsureMesh(path, &error), mesh); // shared, not read again
     EXPECT_EQ(doc->ToText(), before);
     // Naming another file drops the geometry of the old one.
     d->MeshFile("other.2dm");
@@ -116,4 +118,4 @@ TEST(DomainMesh, TheGeometryOfAStoredMeshIsReadOnceAndKeepsTheStoredData) {
     std::remove(path.c_str());
 }
 
-}  // namespace
+} // namespace

@@ -1,6 +1,6 @@
-#include "mesh/MeshIndex.h"
 #include "mesh/MeshReader.h"
 #include "UgridTestFile.h"
+#include "mesh/MeshIndex.h"
 
 #include <gtest/gtest.h>
 
@@ -58,8 +58,9 @@ TEST(Mesh2dm, ReadsNodesElementsBoundariesAndExtent) {
 }
 
 TEST(Mesh2dm, SparseIdsAndCrLf) {
-    const MeshReadResult r =
-        Read2dm("MESH2D\r\nND 5 0 0 0\r\nND 2000000000 1 0 0\r\nND 7 0 1 0\r\nE3T 1 5 2000000000 7\r\n", "a.2dm");
+    const MeshReadResult r = Read2dm(
+        "MESH2D\r\nND 5 0 0 0\r\nND 2000000000 1 0 0\r\nND 7 0 1 0\r\nE3T 1 5 2000000000 7\r\n",
+        "a.2dm");
     ASSERT_TRUE(r.mesh) << r.error;
     EXPECT_EQ(r.mesh->elements[0], (CMesh::Element{0, 1, 2, -1}));
 }
@@ -80,7 +81,8 @@ TEST(Mesh2dm, BadFilesSayWhereAndWhy) {
         {"MESH2D\nND 1 0 zero 0\n", "bad.2dm:2: node 1 has a coordinate that is not a number"},
         {"MESH2D\nND 1 0 nan 0\n", "bad.2dm:2: node 1 has a coordinate that is not a number"},
         {"MESH2D\nND 1 0 0 0\nND 1 1 0 0\n", "bad.2dm:3: node 1 is defined twice"},
-        {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2\n", "bad.2dm:5: element 1 needs 3 nodes"},
+        {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2\n",
+         "bad.2dm:5: element 1 needs 3 nodes"},
         {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3\nNS -1\n",
          "bad.2dm:6: a node string needs at least two nodes"},
         {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3\nNS 1 2\n",
@@ -89,7 +91,8 @@ TEST(Mesh2dm, BadFilesSayWhereAndWhy) {
          "bad.2dm:6: node string names node 8, which does not exist"},
         {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3\nNS 1 -2 4 A\nNS 2 -3 4 B\n",
          "bad.2dm:7: boundary code 4 is used twice"},
-        {"MESH2D\nE6T 1 1 2 3 4 5 6 1\n", "bad.2dm:2: element type E6T is not supported (E3T and E4Q only)"},
+        {"MESH2D\nE6T 1 1 2 3 4 5 6 1\n",
+         "bad.2dm:2: element type E6T is not supported (E3T and E4Q only)"},
     };
     for (const auto& c : cases) {
         const MeshReadResult r = Read2dm(c.text, "bad.2dm");
@@ -160,12 +163,16 @@ TEST(MeshUgrid, BadFilesGiveTheReason) {
          "Mesh2_face_nodes row 1 names node 9, which does not exist"},
         {"two-node face", [](testsupport::UgridSpec& s) { s.faces[1] = -1; },
          "Mesh2_face_nodes row 1 has fewer than 3 nodes"},
-        {"branching boundary", [](testsupport::UgridSpec& s) {
+        {"branching boundary",
+         [](testsupport::UgridSpec& s) {
              s.edges = {1, 2, 2, 5, 2, 3, 5, 6};
              s.edgeCodes = {2, 2, 2, 3};
          },
          "boundary code 2 branches at a node"},
-        {"broken boundary", [](testsupport::UgridSpec& s) { s.edgeCodes = {2, 3, 3, 2}; },
+        {"broken boundary",
+         [](testsupport::UgridSpec& s) {
+             s.edgeCodes = {2, 3, 3, 2};
+         },
          "is not one connected line"},
     };
     const std::string path = Temp("bad.nc");
@@ -181,6 +188,24 @@ TEST(MeshUgrid, BadFilesGiveTheReason) {
     std::remove(path.c_str());
 }
 
+TEST(MeshUgrid, ADimensionFarBeyondTheFileIsRefusedNotAllocated) {
+    // netCDF-4 stores nothing for values never written: a small file can claim 2^31 nodes.
+    const std::string path = Temp("huge.nc");
+    int nc = 0, dim = 0, topo = 0, x = 0, y = 0;
+    ASSERT_EQ(nc_create(path.c_str(), NC_CLOBBER | NC_NETCDF4, &nc), NC_NOERR);
+    nc_def_dim(nc, "nodes", size_t(1) << 31, &dim);
+    nc_def_var(nc, "Mesh2", NC_INT, 0, nullptr, &topo);
+    nc_put_att_text(nc, topo, "cf_role", 13, "mesh_topology");
+    nc_put_att_text(nc, topo, "node_coordinates", 5, "nx ny");
+    nc_def_var(nc, "nx", NC_DOUBLE, 1, &dim, &x);
+    nc_def_var(nc, "ny", NC_DOUBLE, 1, &dim, &y);
+    ASSERT_EQ(nc_close(nc), NC_NOERR);
+    const MeshReadResult r = ReadMeshFile(path);
+    EXPECT_FALSE(r.mesh);
+    EXPECT_EQ(r.error, path + ": more nodes than can be read (2147483648)");
+    std::remove(path.c_str());
+}
+
 TEST(MeshIndex, FindsTheElementUnderAPointAndOnlyNearbyElements) {
     const MeshReadResult r = Read2dm(kGood, "good.2dm");
     ASSERT_TRUE(r.mesh);
@@ -188,7 +213,7 @@ TEST(MeshIndex, FindsTheElementUnderAPointAndOnlyNearbyElements) {
     EXPECT_EQ(index.ElementAt(8, 2), 0);
     EXPECT_EQ(index.ElementAt(2, 8), 1);
     EXPECT_EQ(index.ElementAt(15, 5), 2);
-    EXPECT_EQ(index.ElementAt(10, 5), 0);  // on an edge
+    EXPECT_EQ(index.ElementAt(10, 5), 0); // on an edge
     EXPECT_EQ(index.ElementAt(25, 5), -1);
     std::vector<int> seen;
     index.ForEach(-100, -100, 100, 100, [&](int e) { seen.push_back(e); });
@@ -196,4 +221,4 @@ TEST(MeshIndex, FindsTheElementUnderAPointAndOnlyNearbyElements) {
     EXPECT_EQ(seen, (std::vector<int>{0, 1, 2}));
 }
 
-}  // namespace
+} // namespace

@@ -9,13 +9,13 @@
 namespace testsupport {
 
 struct UgridSpec {
-    std::vector<double> x, y, depth;       // depth positive down; empty for none
-    std::vector<int> faces;                // maxNodes per face, fill -1
+    std::vector<double> x, y, depth; // depth positive down; empty for none
+    std::vector<int> faces;          // maxNodes per face, fill -1
     int maxNodes = 3;
     int startIndex = 0;
-    std::vector<int> edges;                // two per boundary edge
-    std::vector<int> edgeCodes;            // one per edge; empty for none
-    std::string flagMeanings;              // for codes 2, 3, ...
+    std::vector<int> edges;     // two per boundary edge
+    std::vector<int> edgeCodes; // one per edge; empty for none
+    std::string flagMeanings;   // for codes 2, 3, ...
     std::vector<int> flagValues;
     int epsg = 0;
     bool topology = true;
@@ -73,7 +73,8 @@ inline bool WriteUgrid(const std::string& path, const UgridSpec& s) {
             text(vc, "mesh", "Mesh2");
             text(vc, "location", "boundary");
             if (!s.flagValues.empty()) {
-                nc_put_att_int(nc, vc, "flag_values", NC_INT, s.flagValues.size(), s.flagValues.data());
+                nc_put_att_int(nc, vc, "flag_values", NC_INT, s.flagValues.size(),
+                               s.flagValues.data());
                 text(vc, "flag_meanings", s.flagMeanings);
             }
         }
@@ -91,4 +92,4 @@ inline bool WriteUgrid(const std::string& path, const UgridSpec& s) {
     return nc_close(nc) == NC_NOERR;
 }
 
-}  // namespace testsupport
+} // namespace testsupport

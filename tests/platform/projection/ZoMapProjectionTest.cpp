@@ -22,9 +22,9 @@ TEST(MapProjection, RegistryStringsAndIdentifiers) {
         const char* s;
         bool known, geographical;
     } cases[] = {
-        {"LONG/LAT", true, true},  {"UTM-32", true, false},   {"UTM-60S", true, false},
-        {"EPSG:4258", true, true}, {"EPSG:25832", true, false}, {"utm-32", false, false},
-        {"UTM-61", false, false},  {"EPSG:", false, false},   {"EPSG:1x", false, false},
+        {"LONG/LAT", true, true},      {"UTM-32", true, false},     {"UTM-60S", true, false},
+        {"EPSG:4258", true, true},     {"EPSG:25832", true, false}, {"utm-32", false, false},
+        {"UTM-61", false, false},      {"EPSG:", false, false},     {"EPSG:1x", false, false},
         {"EPSG:999999", false, false}, {"", false, false},
     };
     for (const auto& c : cases) {
@@ -49,7 +49,8 @@ void Utm(double lonDeg, double latDeg, int zone, double& e, double& n) {
     const double phi = latDeg * pi / 180, dl = (lonDeg - (zone * 6 - 183)) * pi / 180;
     const double c = 2 * std::sqrt(nn) / (1 + nn);
     const double t = std::sinh(std::atanh(std::sin(phi)) - c * std::atanh(c * std::sin(phi)));
-    const double xi = std::atan(t / std::cos(dl)), eta = std::atanh(std::sin(dl) / std::sqrt(1 + t * t));
+    const double xi = std::atan(t / std::cos(dl)),
+                 eta = std::atanh(std::sin(dl) / std::sqrt(1 + t * t));
     double se = eta, sn = xi;
     for (int j = 1; j <= 4; ++j) {
         se += alpha[j - 1] * std::cos(2 * j * xi) * std::sinh(2 * j * eta);
@@ -116,4 +117,4 @@ TEST(MapProjection, UnknownProjectionsAndPointsThatCannotBeTransformed) {
     EXPECT_NEAR(xs[0], 500000.0, 1e-6);
 }
 
-}  // namespace
+} // namespace

@@ -52,7 +52,8 @@ TEST_F(MapFixture, MeshAndFeaturesLandAtTheirPixels) {
     const double lon = 8.72, lat = 53.87;
     ASSERT_TRUE(view.AddPoint(layer, 1, "Harbour", lon, lat, "LONG/LAT"));
     ASSERT_TRUE(view.AddPolyline(layer, 2, "Line", {500000, 520000}, {5950000, 5950000}, "UTM-32"));
-    ASSERT_TRUE(view.AddPolygon(layer, 3, "Area", {540000, 545000, 545000}, {5935000, 5935000, 5940000}, "UTM-32"));
+    ASSERT_TRUE(view.AddPolygon(layer, 3, "Area", {540000, 545000, 545000},
+                                {5935000, 5935000, 5940000}, "UTM-32"));
     EXPECT_FALSE(view.AddPoint(layer, 4, "Nowhere", 1, 2, "MERCATOR"));
     EXPECT_EQ(view.Overlay(layer).features.size(), 3u);
 
@@ -140,7 +141,8 @@ TEST_F(MapFixture, PanZoomAndViewRectangles) {
     // A null rectangle fits the mesh.
     view.SetViewRect(QRectF());
     const MeshExtent& ext = ExampleMesh()->Extent();
-    EXPECT_TRUE(view.ViewRect().contains(QRectF(QPointF(ext.xMin, ext.yMin), QPointF(ext.xMax, ext.yMax))));
+    EXPECT_TRUE(
+        view.ViewRect().contains(QRectF(QPointF(ext.xMin, ext.yMin), QPointF(ext.xMax, ext.yMax))));
 
     // Wheel and drag as a user does them.
     view.show();
@@ -236,7 +238,7 @@ TEST(MapPage, ShowsTheDomainsMeshBoundariesAndSourcesAndKeepsTheViewOfItsKind) {
     };
     auto page = open();
     CZoMapView* map = page->Map();
-    EXPECT_EQ(map->Mesh(), domain->Mesh());  // the domain's mesh, not a copy
+    EXPECT_EQ(map->Mesh(), domain->Mesh()); // the domain's mesh, not a copy
     ASSERT_GE(page->BoundaryOverlay(), 0);
     ASSERT_GE(page->SourceOverlay(), 0);
     const auto& lines = map->Overlay(page->BoundaryOverlay()).features;
@@ -270,4 +272,4 @@ TEST(MapPage, AMeshThatCannotBeReadIsSaidOnTheMap) {
     EXPECT_EQ(page.BoundaryOverlay(), -1);
 }
 
-}  // namespace
+} // namespace
