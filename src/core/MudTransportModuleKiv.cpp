@@ -6,6 +6,9 @@
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
 #include "bed/MTMorphologyKiv.h"
+#include "conditions/InitialConditionsKiv.h"
+#include "conditions/MTBoundaryConditionsKiv.h"
+#include "conditions/MTSourceKiv.h"
 #include "host/ModuleSelection.h"
 #include "paramfile/Kiv.h"
 #include "watercolumn/MTDispersionKiv.h"
@@ -24,6 +27,9 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTBedGroupKiv(this));
     AddChild(new CMTForcingsGroupKiv(this));
     AddChild(new CMTDispersionKiv(this));
+    AddChild(new CMTSourceKiv(this));
+    AddChild(new CInitialConditionsKiv(this));
+    AddChild(new CMTBoundaryConditionsKiv(this));
     AddChild(new CMTMorphologyKiv(this));
 }
 
