@@ -98,7 +98,11 @@ void CMTBoundaryConditionsKiv::WriteData(void* h) {
     kivEndSection(h);
 }
 
-void CMTBoundaryConditionsKiv::ReadData(void*) { NameComponents(); }
+void CMTBoundaryConditionsKiv::ReadData(void* h) {
+    NameComponents();
+    // Written for the engine, empty; looked up so that it counts as read.
+    kivSectionByNameNum(h, "CODE_1", 1);
+}
 
 int CMTBoundaryConditionsKiv::ValidateData() {
     // Messages name the boundaries as they are now, after any insert or move since the load.

@@ -71,8 +71,10 @@ bool CMTSourceItemKiv::IsDlgUsedInSetup() {
 
 void CMTSourceItemKiv::LoadSize(void* h) { CheckFollowedCount(h, GetItemCount(), "fractions"); }
 
-// The name is for whoever reads the file; reading takes it from the hydrodynamic source.
+// The name is for whoever reads the file; the title always comes from the hydrodynamic
+// source, so the stored name is only looked up, so that it counts as read.
 void CMTSourceItemKiv::WriteData(void* h) { kivPutParam(h, "name", GetTitle()); }
+void CMTSourceItemKiv::ReadData(void* h) { kivKeywordByNameNum(h, "name", 1); }
 
 const char* CMTSourceItemKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMTSourceItemDlg"

@@ -43,6 +43,7 @@ public:
     bool IsDlgUsedInSetup() override;
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
+    void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;
 };
