@@ -42,8 +42,21 @@ const char* CMTBoundaryConditionsComponentItemKiv::GetDlgRuntimeClass(unsigned c
                : CBoundaryConditionsComponentItemKiv::GetDlgRuntimeClass(code);
 }
 
+void CMTBoundaryConditionsComponentItemKiv::Renew() {
+    SetDefault();
+    SetHasBeenTouched(false);
+}
+
 CMTBoundaryConditionsComponentKiv::CMTBoundaryConditionsComponentKiv(CZoSEKivBase* parent)
     : CMTCountListKiv("", "", parent, MTCount::Fractions) {}
+
+CMTBoundaryConditionsComponentItemKiv* CMTBoundaryConditionsComponentKiv::Create() {
+    if (CMTBoundaryConditionsComponentItemKiv* item = m_spares.Take()) {
+        item->Renew();
+        return item;
+    }
+    return CMTCountListKiv::Create();
+}
 
 CString CMTBoundaryConditionsComponentKiv::GetTitle() const {
     const CBoundaryNameKiv* boundary = BoundaryAt(this, GetNumberWhatAmI());

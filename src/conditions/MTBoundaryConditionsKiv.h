@@ -2,6 +2,7 @@
 // host's boundary list ("BoundaryNames"), each with one value per suspended fraction.
 #pragma once
 
+#include "MTSpareItems.h"
 #include "core/MTCountListKiv.h"
 #include "fem/BoundaryBaseInterface.h"
 #include "fem/BoundaryConditionsComponentItemKiv.h"
@@ -12,6 +13,8 @@ public:
     explicit CMTBoundaryConditionsComponentItemKiv(CZoSEKivBase* parent);
     CString GetAbbreviatedTitle() const override { return GetTitle(); }
     const char* GetDlgRuntimeClass(unsigned code) override;
+    // As it was made: the defaults, untouched.
+    void Renew();
 };
 
 // The values at one boundary; its section is named like the boundary's.
@@ -25,10 +28,17 @@ public:
     CString GetTitle() const override;
     int BoundaryCode() override;
 
+    CMTBoundaryConditionsComponentItemKiv* Create() override;
     void LoadSize(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }
     const char* GetDlgRuntimeClass(unsigned code) override;
+
+protected:
+    void DiscardItem(CMTBoundaryConditionsComponentItemKiv* item) override { m_spares.Keep(item); }
+
+private:
+    CMTSpareItems<CMTBoundaryConditionsComponentItemKiv> m_spares;
 };
 
 class CMTBoundaryConditionsKiv : public CZoSEKivListBase<CMTBoundaryConditionsComponentKiv> {

@@ -51,8 +51,27 @@ void CMTSourceItemSubKiv::SetDefault() {
     m_value->SetDefault();
 }
 
+void CMTSourceItemSubKiv::Renew(int number) {
+    SetDefault();
+    SetTitle(FormatString("Fraction %d", number));
+    m_value->SetTitle(GetTitlePattern());
+    m_value->Type(0);
+    m_value->Disable(false);
+    m_value->SetHasBeenTouched(false);
+    SetHasBeenTouched(false);
+}
+
 CMTSourceItemKiv::CMTSourceItemKiv(CZoSEKivBase* parent)
     : CMTCountListKiv("", "SOURCE_%d", parent, MTCount::Fractions) {}
+
+CMTSourceItemSubKiv* CMTSourceItemKiv::Create() {
+    // Components are only ever appended: the one made now takes the place after the last.
+    if (CMTSourceItemSubKiv* component = m_spares.Take()) {
+        component->Renew(GetItemCount() + 1);
+        return component;
+    }
+    return CMTCountListKiv::Create();
+}
 
 const CHDSourceItemKiv* CMTSourceItemKiv::HDSource() const {
     const CHDSourcesKiv* sources = HDSources(this);

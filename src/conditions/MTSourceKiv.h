@@ -2,6 +2,7 @@
 // hydrodynamic source ("HDSources"), in its order, each with one component per fraction.
 #pragma once
 
+#include "MTSpareItems.h"
 #include "core/MTCountListKiv.h"
 #include "fem/FemHelpListBase.h"
 #include "fem/FemInDataKiv.h"
@@ -25,6 +26,8 @@ public:
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;
     void SetDefault() override;
+    // As it was made for the given place among its source's components.
+    void Renew(int number);
 
 private:
     int m_type = kSpecifiedConcentration;
@@ -41,11 +44,18 @@ public:
 
     CString GetTitle() const override;
     bool IsDlgUsedInSetup() override;
+    CMTSourceItemSubKiv* Create() override;
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;
+
+protected:
+    void DiscardItem(CMTSourceItemSubKiv* item) override { m_spares.Keep(item); }
+
+private:
+    CMTSpareItems<CMTSourceItemSubKiv> m_spares;
 };
 
 class CMTSourceKiv : public CZoSEKivListBase<CMTSourceItemKiv>, public CFemHelpListBase {

@@ -237,3 +237,32 @@ TEST(BoundaryConditions, ReInitializeRestoresTheModulesDefaults) {
     EXPECT_EQ(component->GetItem(1)->TypeSI(), 1);
     EXPECT_EQ(component->GetItem(1)->QrdData()->FileName(), "");
 }
+
+TEST(BoundaryConditions, ValuesDroppedWithAFractionComeBackAsNew) {
+    // Items that fewer fractions drop are kept for reuse; they must come back exactly as new
+    // ones would, in boundary conditions and in sources alike.
+    auto edited = NewSetup(3, 1, 2, 2);
+    auto fresh = NewSetup(3, 1, 2, 2);
+    CMTBoundaryConditionsComponentItemKiv* item = Conditions(*edited)->GetItem(1)->GetItem(3);
+    item->Type(1);
+    item->Format(1);
+    item->QrdData()->FileName("sea.qrd0");
+    item->TypeSoft(0);
+    item->SetHasBeenTouched(true);
+    CMTSourceItemSubKiv* component = MTSources(edited->Module())->GetItem(2)->GetItem(3);
+    component->TypeOfComponent(1);
+    component->Value()->Format(1);
+    component->Value()->QrdData()->FileName("outfall.qrd0");
+    component->SetHasBeenTouched(true);
+    (void)edited->ToText();  // leaves the value's type set from the component's
+    CParameterSelectionKiv* model = ModelDefinition(edited->Module());
+    model->NumberOfFractions(1);
+    model->NumberOfFractions(3);
+    EXPECT_FALSE(Conditions(*edited)->GetItem(1)->GetItem(3)->GetHasBeenTouched());
+    CMTSourceItemSubKiv* again = MTSources(edited->Module())->GetItem(2)->GetItem(3);
+    EXPECT_EQ(again->GetTitle(), "Fraction 3");
+    EXPECT_EQ(again->Value()->GetTitle(), "Fraction 3");
+    EXPECT_EQ(again->Value()->Type(), 0);
+    EXPECT_FALSE(again->GetHasBeenTouched());
+    EXPECT_EQ(edited->ToText(), fresh->ToText());
+}
