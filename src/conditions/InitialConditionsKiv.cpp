@@ -106,7 +106,7 @@ void CInitialConditionsFractionDistributionItemKiv::EvenSplit() {
 }
 
 void CInitialConditionsFractionDistributionItemKiv::LoadSize(void* h) {
-    CheckFollowedCount(h, GetItemCount(), "fractions");
+    CheckFollowedCount(h, GetItemCount(), "fraction", "fractions");
 }
 
 void CInitialConditionsFractionDistributionItemKiv::WriteData(void* h) {

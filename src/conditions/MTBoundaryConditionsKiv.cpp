@@ -69,7 +69,7 @@ int CMTBoundaryConditionsComponentKiv::BoundaryCode() {
 }
 
 void CMTBoundaryConditionsComponentKiv::LoadSize(void* h) {
-    CheckFollowedCount(h, GetItemCount(), "fractions");
+    CheckFollowedCount(h, GetItemCount(), "fraction", "fractions");
 }
 
 const char* CMTBoundaryConditionsComponentKiv::GetDlgRuntimeClass(unsigned code) {
@@ -102,7 +102,7 @@ void CMTBoundaryConditionsKiv::NameComponents() {
 
 void CMTBoundaryConditionsKiv::LoadSize(void* h) {
     const CBoundaryNamesKiv* names = BoundaryNames(this);
-    CheckFollowedCount(h, names ? names->GetItemCount() : GetItemCount(), "boundaries");
+    CheckFollowedCount(h, names ? names->GetItemCount() : GetItemCount(), "boundary", "boundaries");
 }
 
 void CMTBoundaryConditionsKiv::WriteData(void* h) {

@@ -6,7 +6,8 @@
 #include "common/Platform.h"
 #include "paramfile/Kiv.h"
 
-inline void CheckFollowedCount(void* h, int expected, const char* what) {
+// one / many name what is followed ("fraction", "fractions").
+inline void CheckFollowedCount(void* h, int expected, const char* one, const char* many) {
     void* keyword = kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1);
     if (!keyword)
         return;
@@ -14,7 +15,7 @@ inline void CheckFollowedCount(void* h, int expected, const char* what) {
     kivGetParam(h, "ZoSEKivListItemCount", &stored, 1, 1);
     if (stored != expected)
         kivWarn(h, "ZoSEKivListItemCount",
-                FormatString("item count %d differs from the number of %s (%d); the list "
-                             "follows the %s",
-                             stored, what, expected, what));
+                FormatString("ZoSEKivListItemCount = %d, but the setup has %d %s; the list "
+                             "follows them",
+                             stored, expected, expected == 1 ? one : many));
 }

@@ -88,7 +88,7 @@ bool CMTSourceItemKiv::IsDlgUsedInSetup() {
     return source && source->Include() != 0;
 }
 
-void CMTSourceItemKiv::LoadSize(void* h) { CheckFollowedCount(h, GetItemCount(), "fractions"); }
+void CMTSourceItemKiv::LoadSize(void* h) { CheckFollowedCount(h, GetItemCount(), "fraction", "fractions"); }
 
 // The name is for whoever reads the file; the title always comes from the hydrodynamic
 // source, so the stored name is only looked up, so that it counts as read.
@@ -119,7 +119,7 @@ CMTSourceKiv::~CMTSourceKiv() {
 
 void CMTSourceKiv::LoadSize(void* h) {
     const CHDSourcesKiv* sources = HDSources(this);
-    CheckFollowedCount(h, sources ? sources->GetItemCount() : GetItemCount(), "sources");
+    CheckFollowedCount(h, sources ? sources->GetItemCount() : GetItemCount(), "source", "sources");
 }
 
 const char* CMTSourceKiv::GetDlgRuntimeClass(unsigned code) {

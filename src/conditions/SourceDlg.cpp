@@ -20,7 +20,7 @@ void CSourceDlg::Initialize() {
     if (auto* list = Section<CMTSourceKiv>()) {
         m_grid->Initialize(this, list, true);
         // Opened for one source ("View location"): that source's row is selected.
-        if (const int feature = CHDSourceGisPropSheet::TakeInitialSelectedFeature(); feature > 0) {
+        if (const int feature = CHDSourceGisPropSheet::GetInitialSelectedFeature(); feature > 0) {
             SetData();
             m_grid->SelectRows(feature, feature);
         }

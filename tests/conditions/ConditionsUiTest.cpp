@@ -4,6 +4,7 @@
 #include "conditions/InitialConditionsLayersGrid.h"
 #include "conditions/MTBoundaryConditionsComponentItemDlg.h"
 #include "conditions/MTBoundaryConditionsGridDlg.h"
+#include "conditions/MTBoundaryGisNavigationDlg.h"
 #include "conditions/MTBoundaryConditionsPropertySheet.h"
 #include "conditions/MTSourceGrid.h"
 #include "conditions/MTSourceItemGrid.h"
@@ -16,6 +17,7 @@
 #include <QGroupBox>
 #include <QHeaderView>
 #include <QLabel>
+#include <QMenu>
 #include <QPushButton>
 #include <QTabWidget>
 
@@ -131,8 +133,9 @@ TEST_F(DialogTest, BoundaryConditionListViewLaysOutABlockPerBoundary) {
     auto dlg = OpenDialog(MTBoundaryConditions(doc->Module()), host);
     auto* sheet = dynamic_cast<CMTBoundaryConditionsPropertySheet*>(dlg.get());
     ASSERT_NE(sheet, nullptr);
-    EXPECT_EQ(Tabs(sheet), (std::vector<QString>{"List view"}));
-    EXPECT_EQ(sheet->GetPage(0)->GetHelpID(), 5016u);
+    EXPECT_EQ(Tabs(sheet), (std::vector<QString>{"Geographic View", "List view"}));
+    EXPECT_EQ(sheet->GetPage(0)->GetHelpID(), 5013u);
+    EXPECT_EQ(sheet->GetPage(1)->GetHelpID(), 5016u);
     auto* grid = Child<CMTBoundaryConditionsGridDlg>(dlg.get(), "boundaryConditionsGrid");
     ASSERT_NE(grid, nullptr);
     EXPECT_EQ(Headings(grid), (std::vector<std::string>{"Boundary Name", "Format", "Edit"}));
@@ -189,8 +192,11 @@ TEST_F(DialogTest, BoundaryConditionSheetRemembersThePageShown) {
     auto* sheet = dynamic_cast<CMTBoundaryConditionsPropertySheet*>(dlg.get());
     ASSERT_NE(sheet, nullptr);
     EXPECT_EQ(sheet->GetActiveIndex(), 0);
-    sheet->OnSetActive(0);
-    EXPECT_EQ(CMTBoundaryConditionsPropertySheet::GetInitialSelectedPage(), 0);
+    sheet->SetActivePage(1);
+    EXPECT_EQ(CMTBoundaryConditionsPropertySheet::GetInitialSelectedPage(), 1);
+    auto again = OpenDialog(MTBoundaryConditions(doc->Module()), host);
+    EXPECT_EQ(dynamic_cast<CMTBoundaryConditionsPropertySheet*>(again.get())->GetActiveIndex(), 1);
+    CMTBoundaryConditionsPropertySheet::SetInitialSelectedPage(0);
 }
 
 TEST_F(DialogTest, BoundaryValueFormEnablesWhatItsTypeAndFormatUse) {
@@ -266,10 +272,13 @@ TEST_F(DialogTest, SourceSheetListsTheHydrodynamicSources) {
     auto dlg = OpenDialog(MTSources(doc->Module()), host);
     auto* sheet = dynamic_cast<CHDSourceGisPropSheet*>(dlg.get());
     ASSERT_NE(sheet, nullptr);
-    EXPECT_EQ(Tabs(sheet), (std::vector<QString>{"List view"}));
-    EXPECT_EQ(sheet->GetPage(0)->GetHelpID(), 5041u);
+    EXPECT_EQ(Tabs(sheet), (std::vector<QString>{"Geographic View", "List view"}));
+    EXPECT_EQ(sheet->GetPage(1)->GetHelpID(), 5041u);
     sheet->ShowHelp();
-    EXPECT_EQ(host.helpIds, (std::vector<unsigned long>{5038}));
+    sheet->SetActivePage(1);
+    sheet->ShowHelp();
+    EXPECT_EQ(host.helpIds, (std::vector<unsigned long>{5037, 5038}));
+    CHDSourceGisPropSheet::SetInitialSelectedPage(0);
     auto* grid = Child<CMTSourceGrid>(dlg.get(), "sourceGrid");
     ASSERT_NE(grid, nullptr);
     EXPECT_EQ(Headings(grid), (std::vector<std::string>{"Source No.", "Name", ""}));
@@ -336,4 +345,44 @@ TEST_F(DialogTest, SourceComponentFormStoresItsTypeAndViewsTheLocation) {
     ASSERT_EQ(grid->GetSelectedRowRanges().size(), 1u);
     EXPECT_EQ(grid->GetSelectedRowRanges()[0].top, 3);
     EXPECT_EQ(CHDSourceGisPropSheet::GetInitialSelectedFeature(), 0);
+}
+
+TEST_F(DialogTest, BoundaryMapOpensFormsAndKeepsItsExtent) {
+    CSetupDocument::OpenResult r = CSetupDocument::Open(MUD_SOURCE_DIR "/examples/estuary.setup");
+    ASSERT_TRUE(r.document);
+    CSetupDocument& doc = *r.document;
+    CMTBoundaryConditionsKiv* bc = MTBoundaryConditions(doc.Module());
+    CMTBoundaryConditionsPropertySheet::SetInitialSelectedPage(0);
+    host.setupDir = MUD_SOURCE_DIR "/examples";
+    auto dlg = OpenDialog(bc, host);
+    auto* map = Child<CMTBoundaryGisNavigationDlg>(dlg.get(), "boundaryMap");
+    ASSERT_NE(map, nullptr);
+    EXPECT_EQ(map->ContourItem(), 2);
+    EXPECT_GE(map->BoundaryLayer(), 0);
+
+    // The menu: the default entries and, where no boundary is hit, no "Edit".
+    QMenu menu;
+    EXPECT_EQ(map->BuildContextMenu(menu, QPointF(-1000, -1000)), 0);
+    EXPECT_EQ(menu.actions().front()->text(), "Fit to mesh");
+    // An "Edit" entry opens the boundary, or its fraction's value by the sub-index.
+    QAction boundary;
+    boundary.setData(2 << 16);
+    map->OnEditCommand(&boundary);
+    QAction value;
+    value.setData((1 << 16) | 3);
+    map->OnEditCommand(&value);
+    QAction past;
+    past.setData(9 << 16);
+    map->OnEditCommand(&past);
+    EXPECT_EQ(host.selected, (std::vector<CZoSEKivBase*>{bc->GetItem(2), bc->GetItem(1)->GetItem(3)}));
+
+    // The extent shown last comes back on the next boundary map.
+    const QRectF extent(480000, 5940000, 20000, 15000);
+    map->Map()->SetViewRect(extent);
+    const QRectF shared = CMTBoundaryGisNavigationDlg::SharedView();
+    EXPECT_FALSE(shared.isEmpty());
+    auto next = OpenDialog(bc, host);
+    auto* nextMap = Child<CMTBoundaryGisNavigationDlg>(next.get(), "boundaryMap");
+    ASSERT_NE(nextMap, nullptr);
+    EXPECT_EQ(CMTBoundaryGisNavigationDlg::SharedView(), shared);
 }

@@ -15,10 +15,20 @@ TEST(ExampleConditions, BoundariesSourcesAndTheStartAreSetUp) {
     ASSERT_EQ(bc->GetItemCount(), doc.GetBoundaryNames()->GetItemCount());
     ASSERT_GE(bc->GetItemCount(), 2);
     EXPECT_EQ(bc->GetItem(1)->GetTitle(), "Sea boundary");
+    // The sea boundary's values come from a time series beside the example, one item per
+    // fraction.
     for (int f = 1; f <= 3; ++f) {
-        EXPECT_EQ(bc->GetItem(1)->GetItem(f)->TypeText(), "Specified values");
-        EXPECT_GT(bc->GetItem(1)->GetItem(f)->Constant(), 0.0);
+        const CMTBoundaryConditionsComponentItemKiv* item = bc->GetItem(1)->GetItem(f);
+        EXPECT_EQ(item->TypeText(), "Specified values");
+        EXPECT_EQ(item->Format(), 1);
+        datafile::Header header;
+        const datafile::ValuesResult values = datafile::ReadValues(
+            MUD_SOURCE_DIR "/examples/" + item->QrdData()->FileName(), {{f - 1}, 0, 1, true}, &header);
+        ASSERT_FALSE(values.error) << values.error->ToString();
+        ASSERT_EQ(item->QrdData()->ItemNumbers(), (std::vector<int>{f}));
+        EXPECT_EQ(header.items[static_cast<size_t>(f - 1)].name, item->QrdData()->ItemName());
     }
+    EXPECT_GT(bc->GetItem(2)->GetItem(1)->Constant(), 0.0);
 
     CMTSourceKiv* sources = MTSources(doc.Module());
     ASSERT_EQ(sources->GetItemCount(), 2);

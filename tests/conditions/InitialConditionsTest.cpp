@@ -212,10 +212,14 @@ TEST(InitialConditions, ADistributionCountOtherThanTheFractionsIsReportedAndNotT
         "  BED_DISTRIBUTION_LAYER_2 {\n   ZoSEKivListItemCount = 1\n  }\n }\n";
     CSetupDocument::OpenResult r = CSetupDocument::FromText(ModuleText(2, 2, body), "t.setup");
     ASSERT_TRUE(r.document);
-    ASSERT_EQ(r.warnings.size(), 2u) << ::testing::PrintToString(WarningTexts(r));
+    // The fraction beyond is reported as content no section reads.
+    ASSERT_EQ(r.warnings.size(), 3u) << ::testing::PrintToString(WarningTexts(r));
+    EXPECT_EQ(r.warnings[1].message,
+              "unknown section 'BED_DISTRIBUTION_FRACTION_5' in "
+              "MUD_TRANSPORT_MODULE/INITIAL_CONDITIONS/BED_DISTRIBUTION_LAYER_1: not read, "
+              "dropped on saving");
     EXPECT_EQ(r.warnings[0].message,
-              "item count 5 differs from the number of fractions (2); the list follows the "
-              "fractions");
+              "ZoSEKivListItemCount = 5, but the setup has 2 fractions; the list follows them");
     EXPECT_EQ(r.warnings[0].pos.line, 8);
     EXPECT_EQ(Shares(Layer(*r.document, 1)), (std::vector<float>{20, 80}));
     EXPECT_EQ(Shares(Layer(*r.document, 2)), (std::vector<float>{50, 50}));

@@ -142,10 +142,8 @@ TEST(Sources, CountsAndChoicesInTheFileThatCannotBeUsedAreReported) {
     ASSERT_TRUE(r.document);
     EXPECT_EQ(WarningTexts(r),
               (std::vector<std::string>{
-                  "item count 3 differs from the number of sources (1); the list follows the "
-                  "sources",
-                  "item count 9 differs from the number of fractions (1); the list follows "
-                  "the fractions",
+                  "ZoSEKivListItemCount = 3, but the setup has 1 source; the list follows them",
+                  "ZoSEKivListItemCount = 9, but the setup has 1 fraction; the list follows them",
                   "type_of_component = 4 is not a known choice (0 to 1); kept as read"}));
     CMTSourceKiv* sources = Sources(*r.document);
     ASSERT_EQ(sources->GetItemCount(), 1);

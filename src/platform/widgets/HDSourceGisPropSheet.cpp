@@ -16,6 +16,8 @@ CHDSourceGisPropSheet::CHDSourceGisPropSheet(QWidget* parent) : CFemPropertyShee
 void CHDSourceGisPropSheet::Initialize() {
     AddPage("CHDSourceGisNavigationDlg", nullptr, "Geographic View");
     AddPage("CSourceDlg", nullptr, "List view");
+    // Both pages have taken the source to show; the next sheet opens without one.
+    s_feature = 0;
     CFemPropertySheetDlg::Initialize();
     SetActivePage(s_page < GetPageCount() ? s_page : 0);
     connect(Tabs(), &QTabWidget::currentChanged, this, [](int page) {
@@ -26,8 +28,8 @@ void CHDSourceGisPropSheet::Initialize() {
 
 void CHDSourceGisPropSheet::ShowHelp() {
     const auto* help = dynamic_cast<const CFemHelpListBase*>(GetSection());
-    const bool list = GetPage(GetActiveIndex()) &&
-                      std::string(GetPage(GetActiveIndex())->metaObject()->className()) == "CSourceDlg";
+    const CZoSEDlgBase* page = GetPage(GetActiveIndex());
+    const bool list = page && std::string(page->metaObject()->className()) == "CSourceDlg";
     const unsigned long id = help ? help->GetHelpID(list ? 1 : 0) : 0;
     if (id != 0 && Host())
         Host()->ShowHelp(id);
@@ -38,9 +40,3 @@ void CHDSourceGisPropSheet::ShowHelp() {
 void CHDSourceGisPropSheet::SetInitialSelectedPage(int page) { s_page = page; }
 
 void CHDSourceGisPropSheet::SetInitialSelectedFeature(int feature) { s_feature = feature; }
-
-int CHDSourceGisPropSheet::TakeInitialSelectedFeature() {
-    const int feature = s_feature;
-    s_feature = 0;
-    return feature;
-}

@@ -19,8 +19,6 @@ public:
     static int GetInitialSelectedPage() { return s_page; }
     static void SetInitialSelectedFeature(int feature);
     static int GetInitialSelectedFeature() { return s_feature; }
-    // The list page takes the feature once; the next sheet opens without one.
-    static int TakeInitialSelectedFeature();
 
 private:
     static int s_page;
