@@ -21,6 +21,8 @@
 
 #include <QApplication>
 #include <QCheckBox>
+#include <QDir>
+#include <QFileInfo>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
@@ -80,6 +82,12 @@ protected:
     QString CopyOfExample(const QString& name = "estuary.setup") {
         const QString path = m_dir.filePath(name);
         EXPECT_TRUE(WriteAll(path, ReadAll(kExample)));
+        // The files the example refers to go with it: the mesh and the data files.
+        const QDir examples = QFileInfo(kExample).dir();
+        QFile::copy(examples.filePath("estuary.2dm"), m_dir.filePath("estuary.2dm"));
+        QDir(m_dir.path()).mkpath("data");
+        for (const QString& f : QDir(examples.filePath("data")).entryList(QDir::Files))
+            QFile::copy(examples.filePath("data/" + f), m_dir.filePath("data/" + f));
         return path;
     }
 
