@@ -84,10 +84,37 @@ void Validate(benchmark::State& state) {
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
+// The number of fractions from 8 to 1 and back, over n boundaries and n sources: every
+// per-fraction list follows (water column, bed, initial conditions, every boundary component,
+// every source item).
+void FractionsEightToOneAndBack(benchmark::State& state) {
+    auto opened = CSetupDocument::FromText(SetupText(static_cast<int>(state.range(0))), "bench.setup");
+    CParameterSelectionKiv* model = ModelDefinition(opened.document->Module());
+    for (auto _ : state) {
+        model->NumberOfFractions(1);
+        model->NumberOfFractions(8);
+    }
+    state.SetItemsProcessed(state.iterations() * state.range(0));
+}
+
+// One boundary inserted in the middle of n and deleted again: the cost of one component,
+// whatever n is.
+void BoundaryInsertInTheMiddle(benchmark::State& state) {
+    const int n = static_cast<int>(state.range(0));
+    auto opened = CSetupDocument::FromText(SetupText(n), "bench.setup");
+    CBoundaryNamesKiv* boundaries = opened.document->GetBoundaryNames();
+    for (auto _ : state) {
+        boundaries->Insert(n / 2, 1);
+        boundaries->Delete(n / 2, 1);
+    }
+}
+
 BENCHMARK(Load)->RangeMultiplier(10)->Range(100, 100000)->Unit(benchmark::kMillisecond);
 BENCHMARK(LoadWithUnknownKeywords)->RangeMultiplier(10)->Range(100, 100000)->Unit(benchmark::kMillisecond);
 BENCHMARK(Save)->RangeMultiplier(10)->Range(100, 100000)->Unit(benchmark::kMillisecond);
 BENCHMARK(Validate)->RangeMultiplier(10)->Range(100, 100000)->Unit(benchmark::kMillisecond);
+BENCHMARK(FractionsEightToOneAndBack)->RangeMultiplier(10)->Range(100, 10000)->Unit(benchmark::kMillisecond);
+BENCHMARK(BoundaryInsertInTheMiddle)->RangeMultiplier(10)->Range(100, 100000)->Unit(benchmark::kMicrosecond);
 
 }  // namespace
 

@@ -26,8 +26,12 @@ public:
             return;
         }
         const ENotifyMessage answers = m_follows == MTCount::Fractions ? kNotifyFractions : kNotifyLayers;
-        if (message == answers)
-            this->SetItemCount(CurrentCount(ModelDefinition(this)), 1);
+        if (message != answers)
+            return;
+        // The notifier is the model definition; asking it directly spares a look-up in the
+        // registry for each of thousands of lists.
+        auto* model = dynamic_cast<CParameterSelectionKiv*>(notifier);
+        this->SetItemCount(CurrentCount(model ? model : ModelDefinition(this)), 1);
     }
 
     MTCount Follows() const { return m_follows; }

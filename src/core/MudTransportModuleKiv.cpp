@@ -6,6 +6,9 @@
 #include "ParameterSelectionKiv.h"
 #include "bed/MTBedGroupKiv.h"
 #include "bed/MTMorphologyKiv.h"
+#include "conditions/InitialConditionsKiv.h"
+#include "conditions/MTBoundaryConditionsKiv.h"
+#include "conditions/MTSourceKiv.h"
 #include "dredging/MTDredgingKiv.h"
 #include "outputs/MTOutputKiv.h"
 #include "host/ModuleSelection.h"
@@ -27,6 +30,9 @@ CMudTransportModuleKiv::CMudTransportModuleKiv(CZoSEKivBase* parent)
     AddChild(new CMTForcingsGroupKiv(this));
     AddChild(new CMTDredgingKiv(this));
     AddChild(new CMTDispersionKiv(this));
+    AddChild(new CMTSourceKiv(this));
+    AddChild(new CInitialConditionsKiv(this));
+    AddChild(new CMTBoundaryConditionsKiv(this));
     AddChild(new CMTMorphologyKiv(this));
     AddChild(new CMTOutputKiv(this));
 }

@@ -60,7 +60,7 @@ public:
         while (m_items.size() > target) {
             T* last = m_items.back();
             m_items.pop_back();
-            delete last;
+            DiscardItem(last);
         }
         const bool grows = m_items.size() < target;
         while (m_items.size() < target) {
@@ -225,6 +225,9 @@ public:
 
 protected:
     const std::vector<T*>& Items() const { return m_items; }
+    // An item that shrinking took off the end. Lists that remake items by the thousand (one
+    // per boundary and fraction) may keep it for their next Create instead.
+    virtual void DiscardItem(T* item) { delete item; }
 
 private:
     template <class F>

@@ -22,6 +22,7 @@
 #include <QApplication>
 #include <QCheckBox>
 #include <QDir>
+#include <QFileInfo>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
@@ -81,13 +82,12 @@ protected:
     QString CopyOfExample(const QString& name = "estuary.setup") {
         const QString path = m_dir.filePath(name);
         EXPECT_TRUE(WriteAll(path, ReadAll(kExample)));
-        // The data files it names, beside it as they are beside the example.
-        const QDir data(QStringLiteral(MUD_SOURCE_DIR "/examples/data"));
-        QDir().mkpath(m_dir.filePath("data"));
-        for (const QString& f : data.entryList(QDir::Files))
-            if (!QFile::exists(m_dir.filePath("data/" + f))) {
-                EXPECT_TRUE(QFile::copy(data.filePath(f), m_dir.filePath("data/" + f)));
-            }
+        // The files the example refers to go with it: the mesh and the data files.
+        const QDir examples = QFileInfo(kExample).dir();
+        QFile::copy(examples.filePath("estuary.2dm"), m_dir.filePath("estuary.2dm"));
+        QDir(m_dir.path()).mkpath("data");
+        for (const QString& f : QDir(examples.filePath("data")).entryList(QDir::Files))
+            QFile::copy(examples.filePath("data/" + f), m_dir.filePath("data/" + f));
         return path;
     }
 
