@@ -52,7 +52,8 @@ public:
     // The formats this value may take, constant first.
     std::vector<int> AllowedFormats() const;
     static CString FormatName(int format);
-    // One line for grids: "Constant" or the kind of variation.
+    // One line for grids: "Constant 0.1 N/m^2" (in the user's unit) or the kind of variation
+    // with its file.
     CString FormatText() const;
 
     void WriteData(void* h) override;
