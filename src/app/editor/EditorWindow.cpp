@@ -18,6 +18,7 @@
 #include "widgets/ZoWheelGuard.h"
 
 #include <QAbstractItemView>
+#include <QAbstractSpinBox>
 #include <QAction>
 #include <QApplication>
 #include <QClipboard>
@@ -31,7 +32,9 @@
 #include <QFrame>
 #include <QHBoxLayout>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenuBar>
 #include <QPushButton>
 #include <QScrollArea>
@@ -137,8 +140,33 @@ private:
     bool m_done = false;
 };
 
+// A line edit claims Ctrl+Z and Ctrl+Y for its own typing even when it has nothing to take
+// back, and forms are full of them: then the keys are the setup's undo and redo.
+class CUndoKeys : public QObject {
+public:
+    using QObject::QObject;
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        if (event->type() != QEvent::ShortcutOverride)
+            return false;
+        const auto* key = static_cast<QKeyEvent*>(event);
+        const bool undo = key->matches(QKeySequence::Undo);
+        const bool redo = key->matches(QKeySequence::Redo) ||
+                          key->keyCombination() == QKeyCombination(Qt::CTRL, Qt::Key_Y);
+        if (!undo && !redo)
+            return false;
+        if (qobject_cast<QAbstractSpinBox*>(watched))
+            return true;
+        if (auto* edit = qobject_cast<QLineEdit*>(watched))
+            return undo ? !edit->isUndoAvailable() : !edit->isRedoAvailable();
+        return false;
+    }
+};
+
 CEditorWindow::CEditorWindow(QWidget* parent) : QMainWindow(parent) {
     ZoInstallWheelGuard();
+    qApp->installEventFilter(new CUndoKeys(this));
     m_undo = new QUndoStack(this);
     connect(m_undo, &QUndoStack::cleanChanged, this, [this](bool clean) { SetModified(!clean); });
     m_revalidate = new QTimer(this);
@@ -410,7 +438,8 @@ void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state
     const CString path = m_currentNode ? NodePath(m_currentNode) : CString();
     const bool hadNode = m_currentNode != nullptr;
     m_restoring = true;
-    CloseDialog(true);
+    // Deleted later: the keys of the undo may still be on their way through the form.
+    CloseDialog(false);
     m_currentNode = nullptr;
     if (!m_doc->Restore(*state)) {
         m_restoring = false;
@@ -532,15 +561,10 @@ void CEditorWindow::ShowReadWarnings(const std::vector<paramfile::Diagnostic>& w
     m_readWarnings = warnings;
     if (warnings.empty())
         return;
-    for (const paramfile::Diagnostic& w : warnings) {
-        auto* item = new QTreeWidgetItem(m_messages);
-        item->setText(0, QStringLiteral("%1:%2:%3").arg(Q(w.file)).arg(w.pos.line).arg(w.pos.column));
-        item->setText(1, tr("warning: %1").arg(Q(w.message)));
-        item->setIcon(0, style()->standardIcon(QStyle::SP_MessageBoxWarning));
-    }
+    FillMessages(false);
     m_messagesDock->show();
-    statusBar()->showMessage(tr("Opened with %n warning(s); see the messages", nullptr,
-                                static_cast<int>(warnings.size())));
+    statusBar()->showMessage(tr("Opened with %1; see the messages")
+                                 .arg(Plural(static_cast<int>(warnings.size()), "warning", "warnings")));
 }
 
 bool CEditorWindow::SaveFile(const QString& path) {
@@ -558,7 +582,8 @@ bool CEditorWindow::SaveFile(const QString& path) {
     SetModified(false);
     AddRecentFile(m_path);
     const int problems = static_cast<int>(m_doc->Errors().size());
-    statusBar()->showMessage(problems ? tr("Saved %1 with %n validation message(s)", nullptr, problems).arg(path)
+    statusBar()->showMessage(problems ? tr("Saved %1 with %2")
+                                            .arg(path, Plural(problems, "validation message", "validation messages"))
                                       : tr("Saved %1").arg(path),
                              8000);
     return true;
@@ -641,7 +666,10 @@ QString CEditorWindow::MessagesText(bool selectedOnly) const {
         if (selectedOnly && !item->isSelected())
             continue;
         const QString where = item->data(0, Qt::UserRole + 1).toString();
-        lines << (where.isEmpty() ? item->text(0) : QStringLiteral("%1: %2").arg(where, item->text(1)));
+        if (where.isEmpty())
+            lines << item->text(0);  // "The setup is valid."
+        else
+            lines << QStringLiteral("%1: %2").arg(where, item->text(1));
     }
     return lines.join('\n');
 }

@@ -150,6 +150,15 @@ TEST_F(EditorUndoTest, UndoOfACountChangeBringsBackEveryItemWithItsValues) {
     EXPECT_EQ(uitest::Child<QLineEdit>(Form(), "fractions")->text(), "3");
     m_window->Redo();
     EXPECT_EQ(ModelDefinition(m_window->Document().Module())->NumberOfFractions(), 1);
+    // The keys reach the setup's history also from a number field that has nothing of its
+    // own to take back.
+    fractions = uitest::Child<QLineEdit>(Form(), "fractions");
+    fractions->setFocus();
+    ASSERT_FALSE(fractions->isUndoAvailable());
+    QTest::keyClick(fractions, Qt::Key_Z, Qt::ControlModifier);
+    EXPECT_EQ(Text(), opened);
+    QTest::keyClick(uitest::Child<QLineEdit>(Form(), "fractions"), Qt::Key_Y, Qt::ControlModifier);
+    EXPECT_EQ(ModelDefinition(m_window->Document().Module())->NumberOfFractions(), 1);
     m_window->Undo();
     EXPECT_EQ(Text(), opened);
 }
