@@ -44,6 +44,7 @@ bench: build/release/build.ninja
 	cmake --build --preset release -j $(JOBS)
 	build/release/bench/paramfile_bench
 	build/release/bench/setup_bench
+	build/release/bench/datafile_bench
 	QT_QPA_PLATFORM=offscreen build/release/bench/editor_bench
 
 build/fuzz/build.ninja: | deps
@@ -61,6 +62,8 @@ fuzz-ci: build/fuzz/build.ninja
 	mkdir -p build/fuzz/corpus-setup
 	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus fuzz/corpus
 	build/fuzz/fuzz/setup_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-setup fuzz/corpus-setup
+	mkdir -p build/fuzz/corpus-datafile
+	build/fuzz/fuzz/datafile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-datafile fuzz/corpus-datafile
 
 format:
 	git ls-files '*.cpp' '*.h' | xargs clang-format -i

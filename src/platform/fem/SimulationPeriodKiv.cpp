@@ -1,6 +1,9 @@
 #include "SimulationPeriodKiv.h"
 
+#include "datafile/ZoFileSelector.h"
 #include "setupeditor/KivFields.h"
+
+#include <cmath>
 
 struct PeriodFields {
     using F = KivField<CSimulationPeriodKiv>;
@@ -30,7 +33,23 @@ int CSimulationPeriodKiv::ValidateData() {
                  "positive time step interval");
         return 0;
     }
+    if (!StartSeconds()) {
+        AddError("The start of the simulation period \"" + m_start +
+                 "\" is not a date and time (yyyy-MM-dd HH:mm:ss)");
+        return 0;
+    }
     return 1;
+}
+
+std::optional<std::int64_t> CSimulationPeriodKiv::StartSeconds() const {
+    return datafile::ParseDateTime(m_start);
+}
+
+void CSimulationPeriodKiv::SetUpQrdValidation_SimulationPeriod(CZoFileSelector& selector) const {
+    const auto start = StartSeconds();
+    if (!start || m_timeSteps < 0 || !(m_interval > 0) || !std::isfinite(m_interval))
+        return;
+    selector.SetTimeValidation(*start, m_timeSteps, m_interval);
 }
 
 CSimulationPeriodKiv* SimulationPeriod(const CZoSEKivBase* node) {

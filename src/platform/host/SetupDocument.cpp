@@ -10,6 +10,7 @@
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
 
+#include <filesystem>
 #include <set>
 
 CSetupDocument::CSetupDocument() {
@@ -27,6 +28,16 @@ CSetupDocument::CSetupDocument() {
 }
 
 CSetupDocument::~CSetupDocument() = default;
+
+CString CSetupDocument::DocumentFolder() const {
+    if (m_fileName.empty())
+        return {};
+    std::error_code ec;
+    const std::filesystem::path full = std::filesystem::absolute(m_fileName, ec);
+    if (ec)
+        return {};
+    return full.lexically_normal().parent_path().string();
+}
 
 CBoundaryNamesKiv* CSetupDocument::GetBoundaryNames() const { return m_domain->BoundaryNames(); }
 

@@ -48,6 +48,7 @@ public:
     int ValidateAll();
 
     const std::string& FileName() const { return m_fileName; }
+    CString DocumentFolder() const override;
     CMudTransportModuleKiv* Module() const { return m_module; }
     CModuleSelection* GetModuleSelection() const { return m_moduleSelection; }
     CDomainKiv* GetDomain() const { return m_domain; }

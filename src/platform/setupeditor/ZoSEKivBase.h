@@ -128,6 +128,9 @@ public:
 
     // Where the editor shows the tree, it selects nodes; elsewhere nothing happens.
     virtual void SelectTreeItem(CZoSEKivBase* node);
+    // The folder of the setup file, against which relative data-file names are taken;
+    // empty for a document that has no file (names are then taken as they stand).
+    virtual CString DocumentFolder() const { return {}; }
 
 private:
     struct Entry {

@@ -146,7 +146,8 @@ TEST_F(Cli, HelpAndBadArguments) {
         EXPECT_NE(r.out.find("usage: mudsetup"), std::string::npos) << command;
     }
     for (const char* command : {"", "frobnicate", "new --fractions 9", "new --layers x",
-                                "validate", "validate a b", "format"}) {
+                                "validate", "validate a b", "validate ''", "format",
+                                "format a.setup -o ''", "new -o ''"}) {
         Result r = Mudsetup(command);
         EXPECT_EQ(r.exitCode, 2) << command;
         EXPECT_NE(r.err.find("usage:"), std::string::npos) << command;

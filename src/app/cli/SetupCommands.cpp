@@ -1,0 +1,156 @@
+// new, validate, format, show: the commands on whole setups.
+#include "Commands.h"
+
+#include "core/MudTransportModuleKiv.h"
+#include "core/ParameterSelectionKiv.h"
+#include "host/SetupDocument.h"
+#include "paramfile/ParamFile.h"
+#include "setupeditor/NavigationTree.h"
+
+#include <cstdio>
+#include <iostream>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace cli {
+namespace {
+
+const char* const kNewHelp =
+    "usage: mudsetup new [--fractions N] [--layers N] [-o FILE]\n"
+    "Writes a new setup with every default: N fractions (1 to 8, default 1) and\n"
+    "N bed layers (1 to 12, default 1). Without -o the setup goes to standard output.\n";
+const char* const kValidateHelp =
+    "usage: mudsetup validate FILE\n"
+    "Validates the setup and prints one line per message, \"PATH: message\".\n"
+    "Exit status: 0 valid, 1 invalid, 2 unreadable or syntax error.\n";
+const char* const kFormatHelp =
+    "usage: mudsetup format FILE [-o FILE]\n"
+    "Loads the setup and saves it again in the canonical form: in place, to the file\n"
+    "given with -o, or to standard output with -o -.\n";
+const char* const kShowHelp =
+    "usage: mudsetup show FILE\n"
+    "Prints the module's navigation tree, one node a line, indented two spaces a level;\n"
+    "nodes not used in the setup are marked \"(not used)\".\n";
+
+// A file argument that is empty would name the current folder or, for -o, the input itself
+// (an unset shell variable); it is a usage error, not a path.
+const CLI::Validator kNotEmpty(
+    [](std::string& value) { return value.empty() ? std::string("must not be empty") : std::string(); },
+    "FILE");
+
+void PrintWarnings(const std::vector<paramfile::Diagnostic>& warnings) {
+    for (const paramfile::Diagnostic& w : warnings)
+        std::cerr << "warning: " << w.ToString() << "\n";
+}
+
+// Opens a setup, reporting failure as the commands must; null on failure.
+std::unique_ptr<CSetupDocument> OpenOrReport(const std::string& path) {
+    CSetupDocument::OpenResult opened = CSetupDocument::Open(path);
+    if (opened.error) {
+        std::cerr << opened.error->ToString() << "\n";
+        return nullptr;
+    }
+    PrintWarnings(opened.warnings);
+    return std::move(opened.document);
+}
+
+bool WriteOut(CSetupDocument& doc, const std::string& output) {
+    if (output == "-") {
+        const std::string text = doc.ToText();
+        std::fwrite(text.data(), 1, text.size(), stdout);
+        return FlushStdout();
+    }
+    std::string error;
+    if (!doc.SaveAs(output, &error)) {
+        std::cerr << "mudsetup: " << error << "\n";
+        return false;
+    }
+    return true;
+}
+
+int New(int fractions, int layers, const std::string& output) {
+    CSetupDocument doc;
+    CParameterSelectionKiv* model = ModelDefinition(doc.Module());
+    model->NumberOfFractions(fractions);
+    model->NumberOfLayers(layers);
+    return WriteOut(doc, output) ? kExitOk : kExitError;
+}
+
+int Validate(const std::string& file) {
+    std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
+    if (!doc)
+        return kExitError;
+    const int ok = doc->ValidateAll();
+    for (const CZoSEKivGlobalBase::ErrorEntry& e : doc->Errors())
+        std::cout << NodePath(e.node) << ": " << e.message << "\n";
+    if (!FlushStdout())
+        return kExitError;
+    return ok && doc->Errors().empty() ? kExitOk : kExitInvalid;
+}
+
+int Format(const std::string& file, const std::string& output) {
+    std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
+    if (!doc)
+        return kExitError;
+    return WriteOut(*doc, output.empty() ? file : output) ? kExitOk : kExitError;
+}
+
+int Show(const std::string& file) {
+    std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
+    if (!doc)
+        return kExitError;
+    WalkNavigationTree(doc->Module(), 0, [](CZoSEKivBase* node, int depth) {
+        std::cout << std::string(static_cast<size_t>(depth) * 2, ' ') << node->GetTitle();
+        if (!node->IsDlgUsedInSetup())
+            std::cout << " (not used)";
+        std::cout << "\n";
+    });
+    return FlushStdout() ? kExitOk : kExitError;
+}
+
+// A count option whose refusal names its range, as the help text does.
+CLI::Option* AddCount(CLI::App* cmd, const std::string& name, int& value, int lo, int hi) {
+    const std::string message = "takes a number from " + std::to_string(lo) + " to " + std::to_string(hi);
+    return cmd->add_option(name, value)->check(CLI::Validator(
+        [lo, hi, message](std::string& text) {
+            int n = 0;
+            return CLI::detail::lexical_cast(text, n) && n >= lo && n <= hi ? std::string() : message;
+        },
+        "N"));
+}
+
+}  // namespace
+
+void AddSetupCommands(CLI::App& app, int& status) {
+    struct Options {
+        int fractions = 1;
+        int layers = 1;
+        std::string file;
+        std::string output;
+    };
+    auto opts = std::make_shared<Options>();
+
+    CLI::App* cmdNew = AddCommand(app, "new", kNewHelp);
+    AddCount(cmdNew, "--fractions", opts->fractions, 1, 8);
+    AddCount(cmdNew, "--layers", opts->layers, 1, 12);
+    cmdNew->add_option("-o", opts->output)->check(kNotEmpty);
+    cmdNew->callback([opts, &status] {
+        status = New(opts->fractions, opts->layers, opts->output.empty() ? "-" : opts->output);
+    });
+
+    CLI::App* cmdValidate = AddCommand(app, "validate", kValidateHelp);
+    cmdValidate->add_option("FILE", opts->file)->required()->check(kNotEmpty);
+    cmdValidate->callback([opts, &status] { status = Validate(opts->file); });
+
+    CLI::App* cmdFormat = AddCommand(app, "format", kFormatHelp);
+    cmdFormat->add_option("FILE", opts->file)->required()->check(kNotEmpty);
+    cmdFormat->add_option("-o", opts->output)->check(kNotEmpty);
+    cmdFormat->callback([opts, &status] { status = Format(opts->file, opts->output); });
+
+    CLI::App* cmdShow = AddCommand(app, "show", kShowHelp);
+    cmdShow->add_option("FILE", opts->file)->required()->check(kNotEmpty);
+    cmdShow->callback([opts, &status] { status = Show(opts->file); });
+}
+
+}  // namespace cli
