@@ -180,6 +180,11 @@ CEditorWindow::CEditorWindow(QWidget* parent) : QMainWindow(parent) {
 }
 
 CEditorWindow::~CEditorWindow() {
+    // The stack tells that it is clean again as it goes, which must not reach this window.
+    disconnect(m_undo, nullptr, this, nullptr);
+    delete m_undo;
+    m_undo = nullptr;
+    m_revalidate->stop();
     // Forms go before the document they edit.
     CloseDialog(true);
     for (QPointer<QWidget>& w : m_retiring)
