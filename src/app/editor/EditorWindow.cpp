@@ -566,14 +566,46 @@ void CEditorWindow::ShowReadWarnings(const std::vector<paramfile::Diagnostic>& w
     m_readWarnings = warnings;
     if (warnings.empty())
         return;
-    FillMessages(false);
+    AddReadWarningItems();
     m_messagesDock->show();
     statusBar()->showMessage(tr("Opened with %1; see the messages")
                                  .arg(Plural(static_cast<int>(warnings.size()), "warning", "warnings")));
 }
 
+void CEditorWindow::AddReadWarningItems() {
+    const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxWarning);
+    for (const paramfile::Diagnostic& w : m_readWarnings) {
+        auto* item = new QTreeWidgetItem(m_messages);
+        item->setText(0, QStringLiteral("%1:%2:%3").arg(Q(w.file)).arg(w.pos.line).arg(w.pos.column));
+        item->setText(1, tr("warning: %1").arg(Q(w.message)));
+        item->setToolTip(1, Q(w.message));
+        item->setIcon(0, icon);
+        item->setData(0, Qt::UserRole + 1, item->text(0));  // what Copy puts first
+    }
+}
+
 bool CEditorWindow::SaveFile(const QString& path) {
     Validate();
+    if (const auto& dropped = m_doc->DroppedOnSave(); !dropped.empty()) {
+        QString list;
+        const size_t shown = std::min<size_t>(dropped.size(), 5);
+        for (size_t i = 0; i < shown; ++i)
+            list += QStringLiteral("\n%1:%2: %3")
+                        .arg(dropped[i].pos.line)
+                        .arg(dropped[i].pos.column)
+                        .arg(Q(dropped[i].message));
+        if (dropped.size() > shown)
+            list += tr("\n... and %n more (see the messages)", nullptr,
+                       static_cast<int>(dropped.size() - shown));
+        const QMessageBox::StandardButton answer =
+            Ask({QMessageBox::Warning, tr("Save Setup"),
+                 tr("The file held content that no section of the setup reads. Saving drops "
+                    "it:\n%1\n\nSave anyway?")
+                     .arg(list),
+                 QMessageBox::Save | QMessageBox::Cancel});
+        if (answer != QMessageBox::Save)
+            return false;
+    }
     std::string error;
     if (!m_doc->SaveAs(path.toStdString(), &error)) {
         Ask({QMessageBox::Critical, tr("Save Setup"),
@@ -586,6 +618,9 @@ bool CEditorWindow::SaveFile(const QString& path) {
     m_undo->setClean();
     SetModified(false);
     AddRecentFile(m_path);
+    // The file now holds what the setup holds: what reading said of the old one is past
+    // (the list shows it until the next validation).
+    m_readWarnings.clear();
     const int problems = static_cast<int>(m_doc->Errors().size());
     statusBar()->showMessage(problems ? tr("Saved %1 with %2")
                                             .arg(path, Plural(problems, "validation message", "validation messages"))
@@ -636,14 +671,7 @@ bool CEditorWindow::RunValidation(bool quiet) {
 
 void CEditorWindow::FillMessages(bool valid) {
     m_messages->clear();
-    const QIcon warning = style()->standardIcon(QStyle::SP_MessageBoxWarning);
-    for (const paramfile::Diagnostic& w : m_readWarnings) {
-        auto* item = new QTreeWidgetItem(m_messages);
-        item->setText(0, QStringLiteral("%1:%2:%3").arg(Q(w.file)).arg(w.pos.line).arg(w.pos.column));
-        item->setText(1, tr("warning: %1").arg(Q(w.message)));
-        item->setIcon(0, warning);
-        item->setData(0, Qt::UserRole + 1, item->text(0));
-    }
+    AddReadWarningItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);
@@ -656,7 +684,7 @@ void CEditorWindow::FillMessages(bool valid) {
         item->setToolTip(1, Q(e.message));
         SetNode(item, e.node);
     }
-    if (valid && m_readWarnings.empty()) {
+    if (valid) {
         auto* item = new QTreeWidgetItem(m_messages);
         item->setText(0, tr("The setup is valid."));
         item->setIcon(0, style()->standardIcon(QStyle::SP_DialogApplyButton));

@@ -7,6 +7,7 @@
 #include "core/MudTransportModuleKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "fem/BoundaryNamesKiv.h"
+#include "fem/DomainKiv.h"
 #include "fem/SimulationPeriodKiv.h"
 #include "fem/UnitUtil.h"
 #include "host/ModuleSelection.h"
@@ -264,7 +265,8 @@ TEST_F(EditorTest, BoundariesAndSourcesChangedOnTheirPagesAreFollowed) {
     Table()->item(1, 2)->setText("500000.5");
     EXPECT_EQ(doc.GetSources()->GetItem(2)->X(), 500000.5);
     Table()->item(1, 3)->setText("not a number");
-    EXPECT_EQ(doc.GetSources()->GetItem(2)->Y(), (5916400.0 + 5985900.0) / 2);
+    const MeshInfo extent = doc.GetDomain()->GetMeshInfo();
+    EXPECT_EQ(doc.GetSources()->GetItem(2)->Y(), (extent.yMin + extent.yMax) / 2);
 
     // The module's own lists, where they exist, appear in the tree under the new names.
     if (doc.GetImportantNode("MudTransportBoundaryConditions")) {
@@ -381,6 +383,33 @@ TEST_F(EditorTest, WarningsFromReadingAreListed) {
     EXPECT_TRUE(w->text(0).startsWith(path + ":")) << w->text(0).toStdString();
     EXPECT_TRUE(w->text(1).startsWith("warning: ")) << w->text(1).toStdString();
     EXPECT_EQ(m_window->Document().GetPeriod()->TimeStepCount(), 0);
+}
+
+TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
+    QByteArray text = ReadAll(kExample);
+    text.replace("MUD_TRANSPORT_MODULE {\n", "MUD_TRANSPORT_MODULE {\n    OUTPUTS {\n    }\n");
+    const QString path = m_dir.filePath("newer.setup");
+    ASSERT_TRUE(WriteAll(path, text));
+    ASSERT_TRUE(m_window->OpenFile(path));
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
+    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).contains("unknown section 'OUTPUTS'"));
+    // Validation keeps the warnings of reading above its own messages.
+    m_window->Validate();
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 2);
+    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).startsWith("warning: "));
+
+    m_answer = QMessageBox::Cancel;
+    EXPECT_FALSE(m_window->SaveFile(path));
+    ASSERT_EQ(m_prompts.size(), 1u);
+    EXPECT_TRUE(m_prompts[0].contains("unknown section 'OUTPUTS'"));
+    EXPECT_EQ(ReadAll(path), text);
+
+    m_answer = QMessageBox::Save;
+    EXPECT_TRUE(m_window->SaveFile(path));
+    EXPECT_FALSE(ReadAll(path).contains("OUTPUTS"));
+    // Once saved, the setup and the file agree: nothing more to ask.
+    EXPECT_TRUE(m_window->SaveFile(path));
+    EXPECT_EQ(m_prompts.size(), 2u);
 }
 
 TEST_F(EditorTest, TheTreeFollowsTheModelAndLosesRemovedSections) {
