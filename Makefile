@@ -26,7 +26,12 @@ test-asan: build/asan/build.ninja
 	ctest --preset asan
 
 run: build
-	@if [ -x build/default/mudsetup-editor ]; then \
+	@if [ -x build/default/mudsetup-editor ] && [ -z "$$DISPLAY$$WAYLAND_DISPLAY$$QT_QPA_PLATFORM" ]; then \
+	  echo "make run: the editor needs a display (neither DISPLAY nor WAYLAND_DISPLAY is set)." >&2; \
+	  echo "Without one, draw it into a PNG:" >&2; \
+	  echo "  build/default/mudsetup-editor --screenshot OUT.png [--select PATH] $(EXAMPLE)" >&2; \
+	  exit 2; \
+	elif [ -x build/default/mudsetup-editor ]; then \
 	  build/default/mudsetup-editor $(EXAMPLE); \
 	else \
 	  build/default/mudsetup show $(EXAMPLE); \
@@ -43,6 +48,7 @@ bench: build/release/build.ninja
 	build/release/bench/mesh_bench
 	build/release/bench/output_bench
 	QT_QPA_PLATFORM=offscreen build/release/bench/map_bench
+	QT_QPA_PLATFORM=offscreen build/release/bench/editor_bench
 
 build/fuzz/build.ninja: | deps
 	cmake --preset fuzz

@@ -44,7 +44,10 @@ CMTSandFractionGrid::CMTSandFractionGrid(QWidget* parent) : CFemGridWnd(parent) 
 void CMTSandFractionGrid::Initialize(CZoSEDlgBase* dialog, CMTSandFractionListKiv* list) {
     m_list = list;
     CFemGridWnd::Initialize(dialog, list);
-    SetColumnHeadings({"Fraction", "Include", "Mean Settling Velocity"});
+    // The unit is the user's; a change of units builds the form again.
+    SetColumnHeadings({"Fraction", "Include",
+                       "Mean Settling Velocity [" +
+                           CUnitUtil::GetUnitName(CUnitUtil::GetUserUnit(kSettlingVelocityUnit)) + "]"});
 }
 
 void CMTSandFractionGrid::GetStyleRowCol(int row, int col, CGridCellStyle& style) {

@@ -80,7 +80,7 @@ TEST(MTDensityListDlg, GridShowsEachLayersFormatAndLinksToIt) {
     auto* grid = Child<CMTDensityGrid>(dlg.get(), "grid");
     ASSERT_NE(grid, nullptr);
     EXPECT_EQ(RowTexts(grid, 0), (std::vector<std::string>{"Layer", "Format", "Edit"}));
-    EXPECT_EQ(RowTexts(grid, 1), (std::vector<std::string>{"Layer 1", "Constant", "Go to..."}));
+    EXPECT_EQ(RowTexts(grid, 1), (std::vector<std::string>{"Layer 1", "Constant 180 kg/m^3", "Go to..."}));
     EXPECT_EQ(RowTexts(grid, 2),
               (std::vector<std::string>{"Layer 2", "Varying in domain: bed.qrd2", "Go to..."}));
     EXPECT_TRUE(grid->CellStyle(2, 1).readOnly);

@@ -61,7 +61,7 @@ TEST(MTDensityListKiv, ValuesAndDataFilesSurviveSaveAndLoad) {
     second->Format(2);
     second->QrdData()->FileName("bed\\density.qrd2");
     second->QrdData()->ItemNumbers({3});
-    EXPECT_EQ(list->GetItem(1)->FormatText(), "Constant");
+    EXPECT_EQ(list->GetItem(1)->FormatText(), "Constant 1234.5 kg/m^3");
 
     const std::string text = doc->ToText();
     auto again = Load(text);

@@ -40,7 +40,7 @@ TEST(MTTransitionListDlg, GridIsGreyedWhileTransitionIsNotIncluded) {
     EXPECT_FALSE(include->isChecked());
     EXPECT_EQ(RowTexts(grid, 0), (std::vector<std::string>{"Transition", "Format", "Edit"}));
     EXPECT_EQ(RowTexts(grid, 2),
-              (std::vector<std::string>{"Between layer 2 and 3", "Constant", "Go to..."}));
+              (std::vector<std::string>{"Between layer 2 and 3", "Constant 0.001 1/s", "Go to..."}));
 
     EXPECT_EQ(CellsNotGreyed(grid, true), std::vector<std::string>{});
     // Drawn disabled: button-face background and grey text, the headings as well.

@@ -132,10 +132,10 @@ TEST_F(ModelDefinitionDialog, OutOfRangeOrNonNumericCountsAreRefusedAndChangeNot
     EXPECT_EQ(fractions->text(), "3");
     EXPECT_EQ(layersField->text(), "4");
     EXPECT_EQ(messages.Messages(),
-              (std::vector<QString>{"Please enter an integer between 1 and 8.",
-                                    "Please enter an integer between 1 and 8.",
-                                    "Please enter an integer between 1 and 12.",
-                                    "Please enter an integer."}));
+              (std::vector<QString>{"Number of Fractions (Parameter Selection): Please enter an integer between 1 and 8.",
+                                    "Number of Fractions (Parameter Selection): Please enter an integer between 1 and 8.",
+                                    "Number of Layers (Parameter Selection): Please enter an integer between 1 and 12.",
+                                    "Number of Fractions (Parameter Selection): Please enter an integer."}));
 
     // An emptied field waits for more typing; left empty, it is refused.
     Type(fractions, "");

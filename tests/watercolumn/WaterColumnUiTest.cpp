@@ -91,7 +91,7 @@ TEST_F(DialogTest, SandGridIsGreyedUntilSandFractionsAreIncluded) {
     auto* include = Child<QCheckBox>(dlg.get(), "includeSandFractions");
     ASSERT_TRUE(grid && include);
     EXPECT_EQ(Headings(grid),
-              (std::vector<std::string>{"Fraction", "Include", "Mean Settling Velocity"}));
+              (std::vector<std::string>{"Fraction", "Include", "Mean Settling Velocity [m/s]"}));
     EXPECT_EQ(Column(grid, 0), (std::vector<std::string>{"1", "2", "3"}));
     EXPECT_FALSE(include->isChecked());
     for (int row = 0; row <= 3; ++row)

@@ -15,9 +15,13 @@
 #include "hydro/HDSourcesKiv.h"
 #include "setupeditor/NavigationTree.h"
 #include "widgets/ZoPrompts.h"
+#include "widgets/ZoWheelGuard.h"
 
+#include <QAbstractItemView>
+#include <QAbstractSpinBox>
 #include <QAction>
 #include <QApplication>
+#include <QClipboard>
 #include <QCloseEvent>
 #include <QDialogButtonBox>
 #include <QDir>
@@ -28,8 +32,11 @@
 #include <QFrame>
 #include <QHBoxLayout>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenuBar>
+#include <QPushButton>
 #include <QScrollArea>
 #include <QSettings>
 #include <QSignalBlocker>
@@ -38,9 +45,11 @@
 #include <QStatusBar>
 #include <QStyle>
 #include <QTextBrowser>
+#include <QTimer>
 #include <QToolBar>
 #include <QToolButton>
 #include <QTreeWidget>
+#include <QUndoStack>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -95,9 +104,75 @@ bool AskNewSetup(QWidget* parent, int& fractions, int& layers) {
     return true;
 }
 
+// How many stored changes can be undone: each keeps one text of the setup (the state before
+// is the previous change's state after), so the history is bounded by a memory budget, and
+// a large setup keeps fewer steps, at least kMinUndoSteps.
+constexpr int kMaxUndoSteps = 200;
+constexpr int kMinUndoSteps = 20;
+constexpr size_t kUndoBudgetBytes = size_t(64) << 20;
+// Quiet validation waits this long after the last stored change.
+constexpr int kRevalidateDelayMs = 400;
+
+QString Plural(int n, const char* one, const char* many) {
+    return QStringLiteral("%1 %2").arg(n).arg(QString::fromUtf8(n == 1 ? one : many));
+}
+
 }  // namespace
 
+// One stored change: the setup's text before and after it. The first redo is the change
+// itself, already made.
+class CSnapshotCommand : public QUndoCommand {
+public:
+    CSnapshotCommand(CEditorWindow* window, const QString& name, std::shared_ptr<const std::string> before,
+                     std::shared_ptr<const std::string> after)
+        : QUndoCommand(name), m_window(window), m_before(std::move(before)), m_after(std::move(after)) {}
+    void undo() override { m_window->RestoreState(m_before); }
+    void redo() override {
+        if (m_done)
+            m_window->RestoreState(m_after);
+        m_done = true;
+    }
+
+private:
+    CEditorWindow* m_window;
+    std::shared_ptr<const std::string> m_before;
+    std::shared_ptr<const std::string> m_after;
+    bool m_done = false;
+};
+
+// A line edit claims Ctrl+Z and Ctrl+Y for its own typing even when it has nothing to take
+// back, and forms are full of them: then the keys are the setup's undo and redo.
+class CUndoKeys : public QObject {
+public:
+    using QObject::QObject;
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        if (event->type() != QEvent::ShortcutOverride)
+            return false;
+        const auto* key = static_cast<QKeyEvent*>(event);
+        const bool undo = key->matches(QKeySequence::Undo);
+        const bool redo = key->matches(QKeySequence::Redo) ||
+                          key->keyCombination() == QKeyCombination(Qt::CTRL, Qt::Key_Y);
+        if (!undo && !redo)
+            return false;
+        if (qobject_cast<QAbstractSpinBox*>(watched))
+            return true;
+        if (auto* edit = qobject_cast<QLineEdit*>(watched))
+            return undo ? !edit->isUndoAvailable() : !edit->isRedoAvailable();
+        return false;
+    }
+};
+
 CEditorWindow::CEditorWindow(QWidget* parent) : QMainWindow(parent) {
+    ZoInstallWheelGuard();
+    qApp->installEventFilter(new CUndoKeys(this));
+    m_undo = new QUndoStack(this);
+    connect(m_undo, &QUndoStack::cleanChanged, this, [this](bool clean) { SetModified(!clean); });
+    m_revalidate = new QTimer(this);
+    m_revalidate->setSingleShot(true);
+    m_revalidate->setInterval(kRevalidateDelayMs);
+    connect(m_revalidate, &QTimer::timeout, this, [this] { RunValidation(true); });
     BuildLayout();
     BuildActions();
     SetDocument(std::make_unique<CSetupDocument>(), QString());
@@ -105,6 +180,11 @@ CEditorWindow::CEditorWindow(QWidget* parent) : QMainWindow(parent) {
 }
 
 CEditorWindow::~CEditorWindow() {
+    // The stack tells that it is clean again as it goes, which must not reach this window.
+    disconnect(m_undo, nullptr, this, nullptr);
+    delete m_undo;
+    m_undo = nullptr;
+    m_revalidate->stop();
     // Forms go before the document they edit.
     CloseDialog(true);
     for (QPointer<QWidget>& w : m_retiring)
@@ -123,7 +203,9 @@ void CEditorWindow::BuildLayout() {
     m_tree->setMinimumWidth(220);
     m_tree->setExpandsOnDoubleClick(true);
     connect(m_tree, &QTreeWidget::currentItemChanged, this,
-            [this](QTreeWidgetItem* current) { OnCurrentItemChanged(current); });
+            [this](QTreeWidgetItem* current, QTreeWidgetItem* previous) {
+                OnCurrentItemChanged(current, previous);
+            });
 
     auto* pane = new QWidget(this);
     auto* paneLayout = new QVBoxLayout(pane);
@@ -180,8 +262,20 @@ void CEditorWindow::BuildLayout() {
     m_messages->header()->setSectionResizeMode(0, QHeaderView::Interactive);
     m_messages->header()->resizeSection(0, 380);
     m_messages->header()->setStretchLastSection(true);
+    m_messages->setSelectionMode(QAbstractItemView::ExtendedSelection);
     connect(m_messages, &QTreeWidget::itemActivated, this,
             [this](QTreeWidgetItem* item) { OnMessageActivated(item); });
+    auto* copy = new QAction(tr("&Copy"), m_messages);
+    copy->setShortcut(QKeySequence::Copy);
+    copy->setShortcutContext(Qt::WidgetShortcut);
+    connect(copy, &QAction::triggered, this,
+            [this] { QApplication::clipboard()->setText(MessagesText(true)); });
+    m_messages->addAction(copy);
+    auto* copyAll = new QAction(tr("Copy &All"), m_messages);
+    connect(copyAll, &QAction::triggered, this,
+            [this] { QApplication::clipboard()->setText(MessagesText(false)); });
+    m_messages->addAction(copyAll);
+    m_messages->setContextMenuPolicy(Qt::ActionsContextMenu);
     m_messagesDock = new QDockWidget(tr("Messages"), this);
     m_messagesDock->setObjectName("messages");
     m_messagesDock->setWidget(m_messages);
@@ -219,6 +313,19 @@ void CEditorWindow::BuildActions() {
     quitAct->setShortcut(QKeySequence::Quit);
 
     QMenu* edit = menuBar()->addMenu(tr("&Edit"));
+    // The stack's own actions name the edit; triggering goes through Undo()/Redo() so that a
+    // field being edited stores its value first.
+    QAction* undoAct = m_undo->createUndoAction(this, tr("&Undo"));
+    QAction* redoAct = m_undo->createRedoAction(this, tr("&Redo"));
+    for (QAction* a : {undoAct, redoAct})
+        disconnect(a, &QAction::triggered, nullptr, nullptr);
+    connect(undoAct, &QAction::triggered, this, [this] { Undo(); });
+    connect(redoAct, &QAction::triggered, this, [this] { Redo(); });
+    undoAct->setShortcut(QKeySequence::Undo);
+    redoAct->setShortcuts({QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_Z), QKeySequence(Qt::CTRL | Qt::Key_Y)});
+    edit->addAction(undoAct);
+    edit->addAction(redoAct);
+    edit->addSeparator();
     edit->addAction(tr("&Preferences..."), this, [this] { OnPreferences(); });
 
     QMenu* setup = menuBar()->addMenu(tr("&Setup"));
@@ -242,6 +349,9 @@ void CEditorWindow::BuildActions() {
     });
     sectionHelp->setShortcut(QKeySequence::HelpContents);
     help->addAction(tr("&Using the Editor"), this, [this] { ShowHelp(0); });
+    help->addSeparator();
+    help->addAction(tr("&About"), this,
+                    [this] { QMessageBox::about(this, tr("About the Mud Transport Setup Editor"), AboutText()); });
 
     QToolBar* bar = addToolBar(tr("Main"));
     bar->setObjectName("main");
@@ -265,6 +375,7 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
     m_retiring.clear();
     m_messages->clear();
     m_readWarnings.clear();
+    m_revalidate->stop();
     m_doc = std::move(doc);
     m_doc->SetTreeItemSelector([this](CZoSEKivBase* node) { SelectTreeItem(node); });
     m_path = path;
@@ -277,9 +388,130 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
         m_tree->clear();
     }
     RebuildTree();
-    SetModified(false);
+    StartNewHistory();
     if (QTreeWidgetItem* first = m_tree->topLevelItem(0))
         m_tree->setCurrentItem(first);
+}
+
+// --- undo --------------------------------------------------------------------------------
+
+void CEditorWindow::StartNewHistory() {
+    m_undo->clear();
+    m_state = std::make_shared<const std::string>(m_doc->ToText());
+    const size_t steps = kUndoBudgetBytes / std::max<size_t>(m_state->size(), 1);
+    m_undo->setUndoLimit(static_cast<int>(std::clamp<size_t>(steps, kMinUndoSteps, kMaxUndoSteps)));
+    m_undo->setClean();
+    SetModified(false);
+}
+
+void CEditorWindow::RecordChange(CZoSEDlgBase* dialog, int hint) {
+    auto after = std::make_shared<const std::string>(m_doc->ToText());
+    if (m_state && *after == *m_state)
+        return;  // nothing that the file holds changed
+    if (!m_state) {
+        m_state = after;
+        return;
+    }
+    m_undo->push(new CSnapshotCommand(this, EditName(dialog, hint), m_state, after));
+    m_state = std::move(after);
+}
+
+void CEditorWindow::SyncState(const QString& name) {
+    if (m_restoring)
+        return;
+    auto now = std::make_shared<const std::string>(m_doc->ToText());
+    if (m_state && *now != *m_state) {
+        m_undo->push(new CSnapshotCommand(this, name, m_state, now));
+        m_state = std::move(now);
+    }
+}
+
+void CEditorWindow::Undo() {
+    CommitPendingEdit();
+    m_undo->undo();
+}
+
+void CEditorWindow::Redo() {
+    CommitPendingEdit();
+    m_undo->redo();
+}
+
+void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state) {
+    if (!state || (m_state && *state == *m_state))
+        return;
+    // The form is shown again for the same place in the tree, which may be a new node.
+    const CString path = m_currentNode ? NodePath(m_currentNode) : CString();
+    const bool hadNode = m_currentNode != nullptr;
+    m_restoring = true;
+    // Deleted later: the keys of the undo may still be on their way through the form.
+    CloseDialog(false);
+    m_currentNode = nullptr;
+    if (!m_doc->Restore(*state)) {
+        m_restoring = false;
+        return;  // texts come from ToText: cannot happen
+    }
+    m_state = state;
+    RebuildTree();
+    CZoSEKivBase* target = nullptr;
+    if (hadNode)
+        for (CZoSEKivBase* node : ShownNodes())
+            if (NodePath(node) == path)
+                target = node;
+    m_restoring = false;
+    if (target) {
+        SelectTreeItem(target);
+        if (m_currentNode != target)
+            ShowNode(target);
+    } else if (QTreeWidgetItem* current = m_tree->currentItem()) {
+        OnCurrentItemChanged(current, nullptr);
+    }
+    m_revalidate->start();
+}
+
+QString CEditorWindow::EditName(CZoSEDlgBase* dialog, int hint) const {
+    // Only the calling form's own node is sure to be alive: a change of a count may just
+    // have deleted the node of the form on show.
+    const QString title = dialog && dialog->GetSection() ? TitleOf(dialog->GetSection()) : QString();
+    QWidget* source = ZoEditSource();
+    if (!source)
+        source = QApplication::focusWidget();
+    QWidget* page = m_scroll ? m_scroll->widget() : nullptr;
+    if (source && page && page->isAncestorOf(source)) {
+        // Grids: the row operation, or the column of the cell.
+        const QAbstractItemView* view = nullptr;
+        for (QWidget* w = source; w && w != page && !view; w = w->parentWidget())
+            view = qobject_cast<const QAbstractItemView*>(w);
+        if (view) {
+            if (hint & kHintItemsAdded)
+                return tr("Insert rows in %1").arg(title);
+            if (hint & kHintItemsDeleted)
+                return tr("Delete rows in %1").arg(title);
+            if (hint & kHintItemsReordered)
+                return tr("Move rows in %1").arg(title);
+            const QModelIndex current = view->currentIndex();
+            if (current.isValid() && view->model()) {
+                const QString column = view->model()->headerData(current.column(), Qt::Horizontal).toString();
+                if (!column.isEmpty())
+                    return tr("%1 in %2").arg(column, title);
+            }
+        } else {
+            const QString label = ZoFieldLabel(source);
+            if (!label.isEmpty())
+                return qobject_cast<const QPushButton*>(source) || qobject_cast<const QToolButton*>(source)
+                           ? tr("%1 in %2").arg(label, title)
+                           : label;
+        }
+    }
+    const QString in = title.isEmpty() ? QString() : tr(" in %1").arg(title);
+    if (hint & kHintItemsAdded)
+        return tr("Add items") + in;
+    if (hint & kHintItemsDeleted)
+        return tr("Delete items") + in;
+    if (hint & kHintItemsReordered)
+        return tr("Move items") + in;
+    if (hint & kHintTitleChanged)
+        return tr("Rename") + in;
+    return tr("Change") + in;
 }
 
 void CEditorWindow::SetModified(bool modified) {
@@ -299,15 +531,26 @@ void CEditorWindow::NewSetup(int fractions, int layers) {
     model->NumberOfFractions(fractions);
     model->NumberOfLayers(layers);
     SetDocument(std::move(doc), QString());
-    statusBar()->showMessage(tr("New setup with %1 fractions and %2 bed layers").arg(fractions).arg(layers),
+    statusBar()->showMessage(tr("New setup with %1 and %2")
+                                 .arg(Plural(fractions, "fraction", "fractions"),
+                                      Plural(layers, "bed layer", "bed layers")),
                              5000);
 }
 
 bool CEditorWindow::OpenFile(const QString& path) {
+    const QFileInfo info(path);
+    if (!info.exists() || info.isDir()) {
+        Ask({QMessageBox::Critical, tr("Open Setup"),
+             info.isDir() ? tr("%1 is a folder, not a setup file.").arg(path)
+                          : tr("The file %1 does not exist.").arg(path),
+             QMessageBox::Ok});
+        return false;
+    }
     CSetupDocument::OpenResult opened = CSetupDocument::Open(path.toStdString());
     if (opened.error) {
-        Ask({QMessageBox::Critical, tr("Open Setup"),
-             tr("The setup could not be opened:\n\n%1").arg(Q(opened.error->ToString())),
+        // A file that cannot be read at all has no line to point to.
+        const QString where = opened.error->pos.line > 0 ? Q(opened.error->ToString()) : Q(opened.error->message);
+        Ask({QMessageBox::Critical, tr("Open Setup"), tr("The setup could not be opened:\n\n%1").arg(where),
              QMessageBox::Ok});
         return false;
     }
@@ -325,8 +568,8 @@ void CEditorWindow::ShowReadWarnings(const std::vector<paramfile::Diagnostic>& w
         return;
     AddReadWarningItems();
     m_messagesDock->show();
-    statusBar()->showMessage(tr("Opened with %n warning(s); see the messages", nullptr,
-                                static_cast<int>(warnings.size())));
+    statusBar()->showMessage(tr("Opened with %1; see the messages")
+                                 .arg(Plural(static_cast<int>(warnings.size()), "warning", "warnings")));
 }
 
 void CEditorWindow::AddReadWarningItems() {
@@ -337,6 +580,7 @@ void CEditorWindow::AddReadWarningItems() {
         item->setText(1, tr("warning: %1").arg(Q(w.message)));
         item->setToolTip(1, Q(w.message));
         item->setIcon(0, icon);
+        item->setData(0, Qt::UserRole + 1, item->text(0));  // what Copy puts first
     }
 }
 
@@ -371,13 +615,15 @@ bool CEditorWindow::SaveFile(const QString& path) {
         return false;
     }
     m_path = QFileInfo(path).absoluteFilePath();
+    m_undo->setClean();
     SetModified(false);
     AddRecentFile(m_path);
     // The file now holds what the setup holds: what reading said of the old one is past
     // (the list shows it until the next validation).
     m_readWarnings.clear();
     const int problems = static_cast<int>(m_doc->Errors().size());
-    statusBar()->showMessage(problems ? tr("Saved %1 with %n validation message(s)", nullptr, problems).arg(path)
+    statusBar()->showMessage(problems ? tr("Saved %1 with %2")
+                                            .arg(path, Plural(problems, "validation message", "validation messages"))
                                       : tr("Saved %1").arg(path),
                              8000);
     return true;
@@ -398,35 +644,88 @@ bool CEditorWindow::MaybeSave() {
 
 bool CEditorWindow::Validate() {
     CommitPendingEdit();
+    return RunValidation(false);
+}
+
+bool CEditorWindow::RunValidation(bool quiet) {
+    m_revalidate->stop();
     const int ok = m_doc->ValidateAll();
+    const bool valid = ok && m_doc->Errors().empty();
+    FillMessages(valid);
+    // Validation may correct values silently; they count as a change of their own.
+    const std::string before = m_state ? *m_state : std::string();
+    SyncState(tr("Corrections by validation"));
+    const bool corrected = m_state && *m_state != before;
+    RefreshTree();
+    if (m_dialog && (!quiet || corrected))
+        m_dialog->SetData();
+    if (quiet)
+        return valid;
+    m_messagesDock->show();
+    statusBar()->showMessage(valid ? tr("The setup is valid")
+                                   : Plural(static_cast<int>(m_doc->Errors().size()), "validation message",
+                                            "validation messages"),
+                             8000);
+    return valid;
+}
+
+void CEditorWindow::FillMessages(bool valid) {
     m_messages->clear();
     AddReadWarningItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);
-        item->setText(0, Q(NodePath(e.node)));
+        const QString path = Q(NodePath(e.node));
+        item->setText(0, e.node ? TitlePath(e.node) : path);
+        item->setToolTip(0, path);
+        item->setData(0, Qt::UserRole + 1, path);
         item->setText(1, Q(e.message));
         item->setIcon(0, icon);
         item->setToolTip(1, Q(e.message));
         SetNode(item, e.node);
     }
-    const bool valid = ok && m_doc->Errors().empty();
     if (valid) {
         auto* item = new QTreeWidgetItem(m_messages);
         item->setText(0, tr("The setup is valid."));
         item->setIcon(0, style()->standardIcon(QStyle::SP_DialogApplyButton));
         item->setFirstColumnSpanned(true);
     }
-    m_messagesDock->show();
-    // Validation may correct values silently.
-    RefreshTree();
-    if (m_dialog)
-        m_dialog->SetData();
-    statusBar()->showMessage(valid ? tr("The setup is valid")
-                                   : tr("%n validation message(s)", nullptr,
-                                        static_cast<int>(m_doc->Errors().size())),
-                             8000);
-    return valid;
+}
+
+QString CEditorWindow::MessagesText(bool selectedOnly) const {
+    QStringList lines;
+    for (int i = 0; i < m_messages->topLevelItemCount(); ++i) {
+        const QTreeWidgetItem* item = m_messages->topLevelItem(i);
+        if (selectedOnly && !item->isSelected())
+            continue;
+        const QString where = item->data(0, Qt::UserRole + 1).toString();
+        if (where.isEmpty())
+            lines << item->text(0);  // "The setup is valid."
+        else
+            lines << QStringLiteral("%1: %2").arg(where, item->text(1));
+    }
+    return lines.join('\n');
+}
+
+QString CEditorWindow::TitlePath(const CZoSEKivBase* node) const {
+    QStringList titles;
+    for (const CZoSEKivBase* n = node; n && n != m_doc.get(); n = n->GetParent()) {
+        // The module's root is where every path starts; it goes without saying.
+        if (n == m_doc->Module() && n != node)
+            break;
+        titles.prepend(TitleOf(n));
+    }
+    return titles.join(QStringLiteral(" > "));
+}
+
+QString CEditorWindow::AboutText() const {
+    return tr("<h3>Mud Transport Setup Editor</h3>"
+              "<p>Version %1</p>"
+              "<p>Edits the mud-transport module of a flexible-mesh flow model's setup: "
+              "fractions, bed layers, settling, erosion, waves, conditions, sources, dredgers "
+              "and outputs.</p>"
+              "<p>Built with Qt %2 (running on Qt %3).</p>")
+        .arg(QStringLiteral(MUDSETUP_VERSION), QStringLiteral(QT_VERSION_STR), QString::fromLatin1(qVersion()));
 }
 
 void CEditorWindow::OnMessageActivated(QTreeWidgetItem* item) {
@@ -607,12 +906,22 @@ bool CEditorWindow::SelectPath(const QString& path) {
 
 // --- the pane ----------------------------------------------------------------------------
 
-void CEditorWindow::OnCurrentItemChanged(QTreeWidgetItem* item) {
+void CEditorWindow::OnCurrentItemChanged(QTreeWidgetItem* item, QTreeWidgetItem* previous) {
     if (!item)
         return;
+    // A value typed on the form and refused as the click on the tree took the focus away
+    // stays on that form, where the user can mend it.
+    if (QWidget* refused = ZoJustRefused(); refused && previous && m_scroll->widget() &&
+                                            m_scroll->widget()->isAncestorOf(refused)) {
+        const QSignalBlocker block(m_tree);
+        m_tree->setCurrentItem(previous);
+        refused->setFocus();
+        return;
+    }
     CZoSEKivBase* node = NodeOf(item);
     if (node) {
         ShowNode(node);
+        ShowHelpOfSelection();
         return;
     }
     // The host data branch itself: what it holds.
@@ -620,11 +929,18 @@ void CEditorWindow::OnCurrentItemChanged(QTreeWidgetItem* item) {
     m_currentNode = nullptr;
     m_paneTitle->setText(item->text(0));
     m_panePath->clear();
-    auto* page = new QLabel(HelpTopicHtml(kHelpHostData));
+    // The pane's title is the heading already.
+    auto* page = new QLabel(HelpTopicBodyHtml(kHelpHostData));
     page->setWordWrap(true);
     page->setAlignment(Qt::AlignLeft | Qt::AlignTop);
     page->setContentsMargins(16, 12, 16, 12);
     m_scroll->setWidget(page);
+    ShowHelpOfSelection();
+}
+
+void CEditorWindow::ShowHelpOfSelection() {
+    // The pane follows the tree whether it is open or not, so it is current when opened.
+    m_help->setHtml(HelpTopicHtml(CurrentHelpId()));
 }
 
 void CEditorWindow::ShowNode(CZoSEKivBase* node) {
@@ -718,11 +1034,14 @@ unsigned long CEditorWindow::CurrentHelpId() const {
 
 // --- CDialogHost -------------------------------------------------------------------------
 
-void CEditorWindow::UpdateDoc(CZoSEDlgBase*, int) {
-    SetModified(true);
+void CEditorWindow::UpdateDoc(CZoSEDlgBase* dialog, int hint) {
+    if (m_restoring)
+        return;
+    RecordChange(dialog, hint);
     RefreshTree();
     if (m_dialog && !m_initializing)
         m_dialog->SetData();
+    m_revalidate->start();
 }
 
 void CEditorWindow::SelectTreeItem(CZoSEKivBase* node) {

@@ -16,6 +16,8 @@
 
 class QAction;
 class QLabel;
+class QTimer;
+class QUndoStack;
 class QMenu;
 class QScrollArea;
 class QTextBrowser;
@@ -32,6 +34,11 @@ public:
     // --- the document ---------------------------------------------------------------
     CSetupDocument& Document() const { return *m_doc; }
     bool IsModified() const { return m_modified; }
+    // Every stored change, as the setup's text before and after it.
+    QUndoStack* UndoStack() const { return m_undo; }
+    // Undo and redo as the menu does them: a field being edited stores its value first.
+    void Undo();
+    void Redo();
     // A new setup with the given numbers of fractions and layers.
     void NewSetup(int fractions, int layers);
     // Opens a setup; on an unreadable file or a syntax error the message is shown and the
@@ -45,6 +52,14 @@ public:
     bool MaybeSave();
     // Validates the whole setup and fills the message list; true when valid.
     bool Validate();
+    // What the message list's "Copy" puts on the clipboard for the selected messages: one
+    // line each, the keyword path and the message.
+    QString MessagesText(bool selectedOnly) const;
+    // A node's place as the user knows it: the titles from below the module (or the host
+    // data) down, "Bed Parameters > Bed Roughness".
+    QString TitlePath(const CZoSEKivBase* node) const;
+    // Help > About.
+    QString AboutText() const;
 
     // --- the tree and the pane ------------------------------------------------------
     // Selects the node with that path (NodePath form, host sections by their names).
@@ -91,6 +106,20 @@ private:
     };
 
     void BuildActions();
+    // Records a stored change on the undo stack under the edit's name.
+    void RecordChange(CZoSEDlgBase* dialog, int hint);
+    // Names the edit in the Undo menu: the field's label, a button's text, a grid's operation.
+    QString EditName(CZoSEDlgBase* dialog, int hint) const;
+    // Makes the document the state of the text (undo, redo); the form follows.
+    void RestoreState(const std::shared_ptr<const std::string>& state);
+    // Takes in changes that were made without an update hint (validation corrects some).
+    void SyncState(const QString& name);
+    void StartNewHistory();
+    // Validates and lists the messages; quiet runs (after a change) leave the docks and the
+    // form alone.
+    bool RunValidation(bool quiet);
+    void FillMessages(bool valid);
+    void ShowHelpOfSelection();
     void BuildLayout();
     void SetDocument(std::unique_ptr<CSetupDocument> doc, const QString& path);
     void SetModified(bool modified);
@@ -106,7 +135,7 @@ private:
     QTreeWidgetItem* ItemOf(CZoSEKivBase* node) const;
     std::unordered_set<const CZoSEKivBase*> LiveNodes() const;
 
-    void OnCurrentItemChanged(QTreeWidgetItem* item);
+    void OnCurrentItemChanged(QTreeWidgetItem* item, QTreeWidgetItem* previous);
     void ShowNode(CZoSEKivBase* node);
     void CloseDialog(bool now);
     void CommitPendingEdit();
@@ -123,7 +152,13 @@ private:
     void AddRecentFile(const QString& path);
     void UpdateRecentMenu();
 
+    friend class CSnapshotCommand;
+
     std::unique_ptr<CSetupDocument> m_doc;
+    QUndoStack* m_undo = nullptr;
+    std::shared_ptr<const std::string> m_state;  // the document's text as last recorded
+    bool m_restoring = false;
+    QTimer* m_revalidate = nullptr;
     QString m_path;
     bool m_modified = false;
     Prompter m_prompter;

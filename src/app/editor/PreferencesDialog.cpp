@@ -2,6 +2,7 @@
 
 #include "EditorSettings.h"
 #include "fem/UnitUtil.h"
+#include "widgets/ZoWheelGuard.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>
@@ -13,11 +14,15 @@
 #include <QSettings>
 #include <QVBoxLayout>
 
+#include <algorithm>
+#include <vector>
+
 namespace {
 QString Key(long group) { return QStringLiteral("units/%1").arg(group); }
 }  // namespace
 
 CPreferencesDialog::CPreferencesDialog(QWidget* parent) : QDialog(parent) {
+    ZoInstallWheelGuard();
     setWindowTitle(tr("Preferences"));
     auto* layout = new QVBoxLayout(this);
     auto* note = new QLabel(tr("Values are shown and entered in these units; the setup file "
@@ -28,7 +33,14 @@ CPreferencesDialog::CPreferencesDialog(QWidget* parent) : QDialog(parent) {
 
     auto* box = new QGroupBox(tr("Units"), this);
     auto* form = new QFormLayout(box);
-    for (const QuantityInfo& q : CUnitUtil::Quantities()) {
+    std::vector<const QuantityInfo*> quantities;
+    for (const QuantityInfo& q : CUnitUtil::Quantities())
+        quantities.push_back(&q);
+    std::stable_sort(quantities.begin(), quantities.end(), [](const QuantityInfo* a, const QuantityInfo* b) {
+        return QString::fromUtf8(a->name).compare(QString::fromUtf8(b->name), Qt::CaseInsensitive) < 0;
+    });
+    for (const QuantityInfo* quantity : quantities) {
+        const QuantityInfo& q = *quantity;
         if (q.units.size() < 2)
             continue;  // nothing to choose
         auto* combo = new QComboBox(box);

@@ -69,6 +69,19 @@ bool ParseOptions(int argc, char** argv, Options& o, std::string& error) {
     return true;
 }
 
+const char* const kNoDisplay =
+    "mudsetup-editor: needs a display (neither DISPLAY nor WAYLAND_DISPLAY is set).\n"
+    "Without one, --screenshot draws the editor into a PNG:\n"
+    "  mudsetup-editor --screenshot OUT.png [--select PATH] FILE\n";
+
+bool HasDisplay() {
+#if defined(__APPLE__) || defined(_WIN32)
+    return true;
+#else
+    return !qEnvironmentVariableIsEmpty("DISPLAY") || !qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY");
+#endif
+}
+
 int TakeScreenshot(CEditorWindow& window, const Options& o) {
     window.SetPrompter([](const CEditorWindow::Prompt& p) {
         std::fprintf(stderr, "mudsetup-editor: %s\n", p.text.toStdString().c_str());
@@ -109,8 +122,14 @@ int main(int argc, char** argv) {
         return 2;
     }
     // Screenshots need no display unless a platform was chosen.
-    if (!options.screenshot.empty() && !options.platformGiven && qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
+    const bool platformChosen = options.platformGiven || !qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM");
+    if (!options.screenshot.empty() && !platformChosen)
         qputenv("QT_QPA_PLATFORM", "offscreen");
+    // Without a display Qt would abort with a message about plug-ins; say what helps instead.
+    if (options.screenshot.empty() && !platformChosen && !HasDisplay()) {
+        std::fputs(kNoDisplay, stderr);
+        return 2;
+    }
 
     QApplication app(argc, argv);
     QApplication::setOrganizationName("mudsetup");

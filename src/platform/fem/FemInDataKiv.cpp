@@ -2,6 +2,7 @@
 
 #include "SimulationPeriodKiv.h"
 #include "datafile/ZoFileSelector.h"
+#include "UnitUtil.h"
 #include "paramfile/Kiv.h"
 
 CString CFemInDataFile::ItemString() const {
@@ -76,9 +77,16 @@ CString CFemInDataKiv::FormatName(int format) {
 }
 
 CString CFemInDataKiv::FormatText() const {
-    if (m_format == 0)
-        return FormatName(0);
-    return FormatName(m_format) + ": " + m_file.FileName();
+    if (m_format != 0)
+        return FormatName(m_format) + ": " + (m_file.FileName().empty() ? CString("(no file)") : m_file.FileName());
+    // The constant as the user sees it elsewhere: in the unit chosen for its quantity.
+    CString text = FormatName(0) + " " + FormatString("%g", ToUserUnit(m_itemType, m_constant));
+    if (CUnitUtil::FindQuantity(m_itemType)) {
+        const CString unit = CUnitUtil::GetUnitName(CUnitUtil::GetUserUnit(m_itemType));
+        if (!unit.empty() && unit != "()")
+            text += " " + unit;
+    }
+    return text;
 }
 
 void CFemInDataKiv::WriteData(void* h) {

@@ -65,7 +65,8 @@ public:
     // not one the value may take (it is kept as read, and validation reports it).
     void WarnUnlessFormatAllowed(void* h) const;
     static CString FormatName(int format);
-    // One line for grids: "Constant" or the kind of variation.
+    // One line for grids: "Constant 0.1 N/m^2" (in the user's unit) or the kind of variation
+    // with its file.
     CString FormatText() const;
 
     void WriteData(void* h) override;

@@ -75,6 +75,19 @@ CSetupDocument::OpenResult CSetupDocument::FromParsed(paramfile::ParseResult par
     return result;
 }
 
+bool CSetupDocument::Restore(const std::string& text) {
+    paramfile::ParseResult parsed = paramfile::ParseText(text, m_fileName);
+    if (parsed.error)
+        return false;
+    // ToText writes every section of the host and the module, so reading them over the
+    // nodes in place leaves nothing of the state before.
+    void* top = const_cast<paramfile::Section*>(&parsed.document->Root());
+    POSITION pos = 0;
+    for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))
+        c->Load(top);
+    return true;
+}
+
 CZoSEKivBase* CSetupDocument::OwnerOf(std::string_view sectionName) {
     POSITION pos = 0;
     for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))

@@ -39,6 +39,10 @@ public:
 
     // The whole setup in its canonical form.
     std::string ToText();
+    // Brings the nodes back to a state that ToText wrote earlier (undo and redo); the
+    // sections of other modules stay as read. False, and nothing changed, when the text does
+    // not parse.
+    bool Restore(const std::string& text);
     // Atomic: on failure the file on disk and this document stay as they were.
     bool SaveAs(const std::string& path, std::string* error);
 

@@ -139,6 +139,7 @@ void CZoNumberEdit::Commit(bool finished) {
     m_waiting = false;
     QPointer<CZoNumberEdit> self(this);
     QPointer<CZoSEDlgBase> dialog(m_dialog);
+    const ZoEditSourceScope source(this);
     m_busy = true;
     m_set(value);
     Refresh();

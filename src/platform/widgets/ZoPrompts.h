@@ -9,8 +9,21 @@
 class QWidget;
 
 // Shows a message about the widget's input (a refused value, for example). By default a
-// warning box, posted to the event loop so that it never runs inside a focus change.
+// warning box, posted to the event loop so that it never runs inside a focus change. The
+// text is led by the field and the section it belongs to ("Number of Fractions (Model
+// definition): ..."), where they are known.
 void ZoShowMessage(QWidget* where, const QString& text);
+
+// The name a user knows a field by: its label (a buddy label, the label of its form row or
+// the label left of it in a grid layout), a button's own text, or its group box's title;
+// empty when there is none. A spin box's or a combo box's inner line edit counts as the box.
+QString ZoFieldLabel(const QWidget* field);
+// The field and the section of a widget as they lead a message; empty when neither is known.
+QString ZoInputContext(const QWidget* where);
+
+// The widget of a message shown while the current event is handled, null once control is
+// back in the event loop: a refused value that a click elsewhere made the field store.
+QWidget* ZoJustRefused();
 
 using ZoMessageSink = std::function<void(QWidget* where, const QString& text)>;
 // Replaces the sink; an empty function restores the default. Returns the previous sink.

@@ -1,6 +1,7 @@
 #include "ZoSEDlgBase.h"
 
 #include "ZoNumberEdit.h"
+#include "ZoWheelGuard.h"
 
 #include <QAbstractItemDelegate>
 #include <QKeyEvent>
@@ -15,7 +16,19 @@ std::map<std::string, DialogFactory>& Factories() {
     static std::map<std::string, DialogFactory> factories;
     return factories;
 }
+QWidget*& EditSource() {
+    static QWidget* source = nullptr;
+    return source;
+}
 }  // namespace
+
+QWidget* ZoEditSource() { return EditSource(); }
+
+ZoEditSourceScope::ZoEditSourceScope(QWidget* field) : m_previous(EditSource()) {
+    EditSource() = field;
+}
+
+ZoEditSourceScope::~ZoEditSourceScope() { EditSource() = m_previous; }
 
 bool RegisterDialogClass(const char* className, DialogFactory factory) {
     Factories()[className] = std::move(factory);
@@ -33,7 +46,7 @@ bool IsDialogClassRegistered(const char* className) {
     return className && Factories().count(className) > 0;
 }
 
-CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) {}
+CZoSEDlgBase::CZoSEDlgBase(QWidget* parent) : QWidget(parent) { ZoInstallWheelGuard(); }
 
 void CZoSEDlgBase::keyPressEvent(QKeyEvent* event) {
     // F1 reaches the innermost dialog around the focus (a page inside a sheet), never two.

@@ -74,6 +74,20 @@ protected:
     CDialogHost* m_host = nullptr;
 };
 
+// The field whose change is being stored while a field stores itself, so that the host can
+// name the edit (undo); null otherwise, when the focus widget tells.
+QWidget* ZoEditSource();
+class ZoEditSourceScope {
+public:
+    explicit ZoEditSourceScope(QWidget* field);
+    ~ZoEditSourceScope();
+    ZoEditSourceScope(const ZoEditSourceScope&) = delete;
+    ZoEditSourceScope& operator=(const ZoEditSourceScope&) = delete;
+
+private:
+    QWidget* m_previous;
+};
+
 // Dialogs are created from the class name a node answers to GetDlgRuntimeClass(2555).
 using DialogFactory = std::function<CZoSEDlgBase*()>;
 bool RegisterDialogClass(const char* className, DialogFactory factory);

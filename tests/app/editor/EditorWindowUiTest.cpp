@@ -373,7 +373,8 @@ TEST_F(EditorTest, ValidationListsMessagesThatLeadToTheirSections) {
     EXPECT_FALSE(m_window->Validate());
     ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
     QTreeWidgetItem* message = m_window->Messages()->topLevelItem(0);
-    EXPECT_EQ(message->text(0), "HYDRODYNAMIC_DENSITY");
+    EXPECT_EQ(message->text(0), "Density");
+    EXPECT_EQ(message->toolTip(0), "HYDRODYNAMIC_DENSITY");
     EXPECT_EQ(message->text(1), "Density mode 9 is not known");
     emit m_window->Messages()->itemActivated(message, 0);
     EXPECT_EQ(m_window->CurrentNode(), density);
@@ -488,10 +489,11 @@ TEST_F(EditorTest, HelpShowsTheTopicOfTheSection) {
     for (unsigned long id : {5001ul, 5011ul, 5028ul, 5044ul, 5046ul, 5047ul})
         EXPECT_TRUE(HasHelpTopic(id)) << id;
     m_window->ShowHelp(5046);
-    EXPECT_TRUE(m_window->HelpView()->toPlainText().contains("Model definition"));
+    EXPECT_TRUE(m_window->HelpView()->toPlainText().contains("Number of Fractions"));
+    // A section without a topic of its own gets the general help, without internal numbers.
     m_window->ShowHelp(4999);
-    EXPECT_TRUE(m_window->HelpView()->toPlainText().contains("There is no help topic 4999"));
-    EXPECT_TRUE(m_window->HelpView()->toPlainText().contains(FindHelpTopic(0).title));
+    EXPECT_TRUE(m_window->HelpView()->toPlainText().startsWith(FindHelpTopic(0).title));
+    EXPECT_FALSE(m_window->HelpView()->toPlainText().contains("4999"));
 }
 
 TEST_F(EditorTest, UnitsChosenInThePreferencesAreRemembered) {

@@ -331,7 +331,7 @@ TEST_F(Grid, NumberCellsEditInTheUsersUnitAndRefuseBadInput) {
     Enter(editor, "-1");
     QApplication::processEvents();
     EXPECT_EQ(list->GetItem(1)->velocity, 0.001);
-    EXPECT_EQ(messages.Messages(), (std::vector<QString>{"Please enter a number of at least 0 mm/s."}));
+    EXPECT_EQ(messages.Messages(), (std::vector<QString>{"Velocity (Items): Please enter a number of at least 0 mm/s."}));
     EXPECT_EQ(host.hints, (std::vector<int>{1}));
 }
 
