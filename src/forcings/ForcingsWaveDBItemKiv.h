@@ -1,0 +1,17 @@
+#pragma once
+
+#include "setupeditor/ZoSEKivBase.h"
+
+class CForcingsWaveDBFile;
+
+// One point of the wave database (a wind speed, direction and water level) with its file.
+class CForcingsWaveDBItemKiv : public CZoSEKivBase {
+public:
+    explicit CForcingsWaveDBItemKiv(CZoSEKivBase* parent);
+    CForcingsWaveDBFile* File() const { return m_file; }
+    int ValidateData() override { return 1; }
+    void SetDefault() override;
+
+private:
+    CForcingsWaveDBFile* m_file;
+};
