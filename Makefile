@@ -40,6 +40,8 @@ bench: build/release/build.ninja
 	build/release/bench/paramfile_bench
 	build/release/bench/setup_bench
 	build/release/bench/datafile_bench
+	build/release/bench/mesh_bench
+	QT_QPA_PLATFORM=offscreen build/release/bench/map_bench
 
 build/fuzz/build.ninja: | deps
 	cmake --preset fuzz
@@ -54,8 +56,10 @@ fuzz-ci: build/fuzz/build.ninja
 	cmake --build --preset fuzz -j $(JOBS)
 	mkdir -p build/fuzz/corpus
 	mkdir -p build/fuzz/corpus-setup
+	mkdir -p build/fuzz/corpus-mesh
 	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus fuzz/corpus
 	build/fuzz/fuzz/setup_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-setup fuzz/corpus-setup
+	build/fuzz/fuzz/mesh_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-mesh fuzz/corpus-mesh
 	mkdir -p build/fuzz/corpus-datafile
 	build/fuzz/fuzz/datafile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-datafile fuzz/corpus-datafile
 

@@ -9,11 +9,17 @@
 #include "hydro/HDDensityKiv.h"
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
+#include "widgets/FemBase.h"
+#include "widgets/ZoFileSelectorDlg.h"
+#include "projection/ZoMapProjection.h"
+#include "widgets/GisNavigationDlg.h"
 #include "widgets/ZoPrompts.h"
 
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDateTimeEdit>
+#include <QDir>
+#include <QFileInfo>
 #include <QDoubleValidator>
 #include <QFormLayout>
 #include <QGridLayout>
@@ -75,14 +81,21 @@ public:
 protected:
     QVBoxLayout* Column() {
         if (!m_column) {
-            auto* outer = new QHBoxLayout(this);
-            outer->setContentsMargins(0, 0, 0, 0);
+            m_outer = new QHBoxLayout(this);
+            m_outer->setContentsMargins(0, 0, 0, 0);
             m_column = new QVBoxLayout;
             m_column->setSpacing(12);
-            outer->addLayout(m_column, 1);
-            outer->addStretch(0);
+            m_outer->addLayout(m_column, 1);
+            m_outer->addStretch(0);
         }
         return m_column;
+    }
+    // A map beside the column takes the room the column does not need.
+    void AddMap(QWidget* map) {
+        Column();
+        delete m_outer->takeAt(1);
+        m_outer->setStretch(0, 0);
+        m_outer->addWidget(map, 1);
     }
     QFormLayout* Group(const QString& title) {
         auto* box = new QGroupBox(title, this);
@@ -99,8 +112,19 @@ protected:
     }
 
 private:
+    QHBoxLayout* m_outer = nullptr;
     QVBoxLayout* m_column = nullptr;
 };
+
+// The map of the domain inside a host page, bound to the page's node and host.
+CMeshNavigationDlg* EmbedMap(CZoSEDlgBase* page) {
+    auto* map = new CMeshNavigationDlg;
+    map->setParent(page);
+    map->setMinimumHeight(320);
+    map->Attach(page->GetSection(), page->Host());
+    map->Initialize();
+    return map;
+}
 
 // --- modules ---------------------------------------------------------------------------
 
@@ -160,7 +184,10 @@ public:
         mesh->addRow(tr("Mesh file"), fileRow);
         m_projection = new QComboBox(this);
         m_projection->setEditable(true);
-        m_projection->addItems({"UTM-31", "UTM-32", "UTM-33", "LONG/LAT"});
+        for (const ProjectionEntry& e : CZoMapProjection::Entries()) {
+            m_projection->addItem(Q(e.name));
+            m_projection->setItemData(m_projection->count() - 1, Q(e.description), Qt::ToolTipRole);
+        }
         mesh->addRow(tr("Projection"), m_projection);
 
         auto* extentBox = new QGroupBox(tr("Extent"), this);
@@ -204,27 +231,31 @@ public:
         vertical->addRow(tr("Z layers"), m_z);
         m_total = new QLabel(this);
         vertical->addRow(tr("Layers in total"), m_total);
+        m_counts = new QLabel(this);
+        mesh->addRow(tr("Contents"), m_counts);
 
         connect(m_file, &QLineEdit::editingFinished, this, [this] {
-            if (S(m_file->text()) != Node()->MeshFile()) {
-                Node()->MeshFile(S(m_file->text()));
-                UpdateDoc(kHintValueChanged);
-            }
+            if (S(m_file->text()) != Node()->MeshFile())
+                OpenMesh(m_file->text());
         });
         connect(browse, &QPushButton::clicked, this, [this] {
-            const QString file = ZoGetOpenFileName(this, tr("Mesh file"), m_file->text(),
-                                                   tr("Meshes (*.mesh);;All files (*)"));
-            if (file.isEmpty())
-                return;
-            m_file->setText(file);
-            Node()->MeshFile(S(file));
-            UpdateDoc(kHintValueChanged);
+            const QString file = ZoGetOpenFileName(
+                this, tr("Mesh file"), Q(AbsoluteFilePath(S(m_file->text()))),
+                tr("Meshes (*.2dm *.nc);;SMS 2dm meshes (*.2dm);;UGRID netCDF meshes (*.nc);;All files (*)"));
+            if (!file.isEmpty())
+                OpenMesh(Relative(file));
         });
         auto storeProjection = [this] {
-            if (S(m_projection->currentText()) != Node()->Projection()) {
-                Node()->Projection(S(m_projection->currentText()));
-                UpdateDoc(kHintValueChanged);
+            const CString p = S(m_projection->currentText().trimmed());
+            if (p == Node()->Projection())
+                return;
+            if (!CZoMapProjection::IsKnown(p)) {
+                ZoShowMessage(this, tr("\"%1\" is not a known projection.").arg(Q(p)));
+                SetData();
+                return;
             }
+            Node()->Projection(p);
+            UpdateDoc(kHintValueChanged);
         };
         connect(m_projection, &QComboBox::activated, this, storeProjection);
         connect(m_projection->lineEdit(), &QLineEdit::editingFinished, this, storeProjection);
@@ -248,7 +279,32 @@ public:
                 UpdateDoc(kHintValueChanged);
             }
         });
+        m_map = EmbedMap(this);
+        AddMap(m_map);
         Finish();
+    }
+
+    CMeshNavigationDlg* MapPage() const { return m_map; }
+
+    // Reads the mesh and takes everything from it; a mesh that cannot be read changes nothing.
+    bool OpenMesh(const QString& stored) {
+        const CString name = S(stored.trimmed());
+        if (name.empty()) {
+            Node()->MeshFile(name);
+            UpdateDoc(kHintValueChanged);
+            return true;
+        }
+        std::string error;
+        const int before = Node()->BoundaryNames()->GetItemCount();
+        if (!Node()->LoadMesh(name, AbsoluteFilePath(name), &error)) {
+            ZoShowMessage(this, Q(error));
+            SetData();
+            return false;
+        }
+        const int after = Node()->BoundaryNames()->GetItemCount();
+        UpdateDoc(kHintValueChanged | (after > before ? kHintItemsAdded : 0) |
+                  (after < before ? kHintItemsDeleted : 0) | kHintTitleChanged);
+        return true;
     }
 
     void SetData() override {
@@ -260,8 +316,11 @@ public:
         if (!m_projection->lineEdit()->hasFocus())
             m_projection->setCurrentText(Q(d->Projection()));
         for (auto& axis : m_extent)
-            for (NumberEdit* e : axis)
+            for (NumberEdit* e : axis) {
                 e->Show();
+                // A mesh that was read gives the extent.
+                e->setReadOnly(d->Mesh() != nullptr);
+            }
         m_threeD->setChecked(d->ThreeD());
         int kindIndex = m_kind->findData(d->VerticalKind());
         if (kindIndex < 0) {
@@ -275,6 +334,15 @@ public:
         m_kind->setEnabled(d->ThreeD());
         m_sigma->setEnabled(d->ThreeD());
         m_z->setEnabled(d->ThreeD() && d->VerticalKind() == 2);
+        m_map->SetData();
+        if (const MeshPtr& m = d->Mesh())
+            m_counts->setText(tr("%1 nodes, %2 triangles, %3 quadrilaterals, %4 open boundaries")
+                                  .arg(m->NodeCount())
+                                  .arg(m->TriangleCount())
+                                  .arg(m->QuadrilateralCount())
+                                  .arg(m->boundaries.size()));
+        else
+            m_counts->setText(d->MeshExist() ? tr("The mesh cannot be read") : tr("No mesh"));
     }
 
 private:
@@ -285,7 +353,15 @@ private:
         return members[axis][max];
     }
     CDomainKiv* Node() const { return Section<CDomainKiv>(); }
+    // A file inside the setup's folder is stored relative to it.
+    QString Relative(const QString& file) const {
+        const QString base = Q(AbsoluteFilePath("."));
+        const QString rel = QDir(base).relativeFilePath(file);
+        return rel.startsWith("..") || QFileInfo(rel).isAbsolute() ? file : rel;
+    }
     QLineEdit* m_file = nullptr;
+    QLabel* m_counts = nullptr;
+    CMeshNavigationDlg* m_map = nullptr;
     QComboBox* m_projection = nullptr;
     NumberEdit* m_extent[3][2] = {};
     QCheckBox* m_threeD = nullptr;
@@ -332,6 +408,30 @@ public:
         m_duration = new QLabel(this);
         f->addRow(tr("Duration"), m_duration);
 
+        // Not stored: a file to hold against the period while it is edited.
+        QFormLayout* d = Group(tr("Data files"));
+        d->addRow(new QLabel(tr("Data files that vary in time must cover the whole period."), this));
+        m_dataFile = new QLineEdit(this);
+        m_dataFile->setObjectName("dataFile");
+        auto* select = new QPushButton(tr("Select ..."), this);
+        select->setObjectName("selectDataFile");
+        m_viewDataFile = new QPushButton(tr("View ..."), this);
+        m_viewDataFile->setObjectName("viewDataFile");
+        auto* fileRow = new QHBoxLayout;
+        fileRow->addWidget(m_dataFile, 1);
+        fileRow->addWidget(select);
+        fileRow->addWidget(m_viewDataFile);
+        d->addRow(tr("Check a file"), fileRow);
+        m_dataFileCheck = new QLabel(this);
+        m_dataFileCheck->setObjectName("dataFileCheck");
+        m_dataFileCheck->setWordWrap(true);
+        d->addRow(m_dataFileCheck);
+        connect(m_dataFile, &QLineEdit::editingFinished, this, [this] { CheckDataFile(); });
+        connect(select, &QPushButton::clicked, this, [this] { SelectDataFile(); });
+        connect(m_viewDataFile, &QPushButton::clicked, this, [this] {
+            CFemBase::OpenDataFile(FileSelector().AbsolutePath(S(m_dataFile->text())), {}, this);
+        });
+
         connect(m_start, &QDateTimeEdit::editingFinished, this, [this] {
             const CString text = S(m_start->dateTime().toString(kTimeFormat));
             if (text != Node()->StartTime()) {
@@ -368,10 +468,53 @@ public:
         m_end->setText(start.isValid() && seconds >= 0 && seconds < 1e11
                            ? start.addSecs(whole).toString(kTimeFormat)
                            : QString("-"));
+        CheckDataFile();
     }
 
 private:
     CSimulationPeriodKiv* Node() const { return Section<CSimulationPeriodKiv>(); }
+    static constexpr const char* kDataFilter =
+        "Data files (*.qrd0;*.qrd1;*.qrd2;*.qrdu;*.kx0;*.kx2)|*.qrd0;*.qrd1;*.qrd2;*.qrdu;*.kx0;"
+        "*.kx2|All files (*.*)|*.*||";
+    // A selector with the period's time check, relative names against the setup's folder.
+    CZoFileSelector FileSelector() const {
+        CZoFileSelector s(Node());
+        s.SetFilter(kDataFilter);
+        Node()->SetUpQrdValidation_SimulationPeriod(s);
+        return s;
+    }
+    void CheckDataFile() {
+        const CString name = S(m_dataFile->text().trimmed());
+        const CZoFileSelector s = FileSelector();
+        const auto header = name.empty() ? nullptr : s.Header(name);
+        m_viewDataFile->setEnabled(header && header->header);
+        if (name.empty()) {
+            m_dataFileCheck->clear();
+            return;
+        }
+        CString error;
+        if (s.IsQrdFileValid(name, &error)) {
+            m_dataFileCheck->setStyleSheet("");
+            m_dataFileCheck->setText(tr("The file covers the period."));
+        } else {
+            m_dataFileCheck->setStyleSheet("color: #b00000");
+            m_dataFileCheck->setText(Q(error));
+        }
+    }
+    void SelectDataFile() {
+        CZoFileSelectorDlg dialog(S(m_dataFile->text().trimmed()), kDataFilter, "qrd0", this);
+        const CZoFileSelector s = FileSelector();
+        dialog.SetBaseFolder(s.BaseFolder());
+        Node()->SetUpQrdValidation_SimulationPeriod(dialog);
+        if (ZoRunFileSelector(dialog) != QDialog::Accepted)
+            return;
+        m_dataFile->setText(Q(dialog.FileName()));
+        CheckDataFile();
+    }
+
+    QLineEdit* m_dataFile = nullptr;
+    QPushButton* m_viewDataFile = nullptr;
+    QLabel* m_dataFileCheck = nullptr;
     QDateTimeEdit* m_start = nullptr;
     QLabel* m_startNote = nullptr;
     QSpinBox* m_steps = nullptr;
@@ -391,6 +534,7 @@ public:
     void Initialize() override {
         auto* box = new QGroupBox(GroupTitle(), this);
         box->setMaximumWidth(880);
+        box->setMinimumWidth(MinimumWidth());
         auto* layout = new QHBoxLayout(box);
         m_table = new QTableWidget(this);
         m_table->setColumnCount(m_headers.size());
@@ -428,11 +572,21 @@ public:
         buttons->addStretch(1);
         layout->addLayout(buttons);
         Column()->addWidget(box, 1);
+        // The items on the map: a click there selects the item here, and back.
+        m_map = EmbedMap(this);
+        AddMap(m_map);
 
         connect(m_table, &QTableWidget::itemChanged, this, [this](QTableWidgetItem* item) {
             StoreCell(item->row() + 1, item->column(), item);
         });
-        connect(m_table, &QTableWidget::currentCellChanged, this, [this] { EnableButtons(); });
+        connect(m_table, &QTableWidget::currentCellChanged, this, [this] {
+            EnableButtons();
+            m_map->Map()->SelectFeature(MapOverlay(), CurrentItem());
+        });
+        connect(m_map, &CGisNavigationDlg::featureSelected, this, [this](int overlay, int number) {
+            if (overlay == MapOverlay() && number >= 1 && number <= List()->GetItemCount())
+                SelectItem(number);
+        });
         CZoSEDlgBase::Initialize();
         if (List()->GetItemCount() > 0)
             SelectItem(1);
@@ -453,12 +607,15 @@ public:
                 FillCell(r + 1, c, item);
             }
         EnableButtons();
+        m_map->SetData();
+        m_map->Map()->SelectFeature(MapOverlay(), CurrentItem());
     }
 
     // The list operations, also for tests: positions from 1.
     int CurrentItem() const { return m_table->currentRow() + 1; }
     void SelectItem(int index) { m_table->setCurrentCell(index - 1, 0); }
     QTableWidget* Table() const { return m_table; }
+    CMeshNavigationDlg* MapPage() const { return m_map; }
 
     void AddItem() {
         CZoSEKivBase* item = AppendToList();
@@ -501,6 +658,9 @@ protected:
     virtual QString BaseName() const = 0;
     virtual void FillCell(int index, int column, QTableWidgetItem* item) = 0;
     virtual void StoreCell(int index, int column, QTableWidgetItem* item) = 0;
+    // The map layer that shows the items.
+    virtual int MapOverlay() const = 0;
+    virtual int MinimumWidth() const { return 360; }
 
     // Stores a new name; an empty one is refused (the name is what the other modules show).
     bool Rename(CZoSEKivBase* node, const QString& text) {
@@ -541,6 +701,7 @@ private:
 
     QStringList m_headers;
     QTableWidget* m_table = nullptr;
+    CMeshNavigationDlg* m_map = nullptr;
     QPushButton* m_insert = nullptr;
     QPushButton* m_rename = nullptr;
     QPushButton* m_delete = nullptr;
@@ -558,6 +719,7 @@ protected:
     CZoSEKivListBaseInterface* List() const override { return Section<CBoundaryNamesKiv>(); }
     CZoSEKivBase* AppendToList() override { return Section<CBoundaryNamesKiv>()->Append(); }
     QString BaseName() const override { return tr("Boundary"); }
+    int MapOverlay() const override { return MapPage()->BoundaryOverlay(); }
     void FillCell(int index, int column, QTableWidgetItem* item) override {
         const CBoundaryNameKiv* b = Section<CBoundaryNamesKiv>()->GetItem(index);
         if (column == 0) {
@@ -597,6 +759,8 @@ protected:
     CZoSEKivListBaseInterface* List() const override { return Section<CHDSourcesKiv>(); }
     CZoSEKivBase* AppendToList() override { return Section<CHDSourcesKiv>()->Append(); }
     QString BaseName() const override { return tr("Source"); }
+    int MapOverlay() const override { return MapPage()->SourceOverlay(); }
+    int MinimumWidth() const override { return 560; }
     void FillCell(int index, int column, QTableWidgetItem* item) override {
         const CHDSourceItemKiv* s = Section<CHDSourcesKiv>()->GetItem(index);
         switch (column) {

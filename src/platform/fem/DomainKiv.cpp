@@ -1,6 +1,7 @@
 #include "DomainKiv.h"
 
 #include "BoundaryNamesKiv.h"
+#include "mesh/MeshReader.h"
 #include "setupeditor/KivFields.h"
 
 struct DomainFields {
@@ -54,8 +55,56 @@ void CDomainKiv::SetMeshInfo(const MeshInfo& i) {
 }
 
 void CDomainKiv::MeshFile(const CString& file) {
+    if (file != m_meshFile)
+        m_mesh.reset(), m_meshPath.clear();
     m_meshFile = file;
     NotifyListeners(kMeshChanged);
+}
+
+bool CDomainKiv::LoadMesh(const CString& storedName, const std::string& path, std::string* error) {
+    MeshReadResult r = ReadMeshFile(path);
+    if (!r.mesh) {
+        if (error)
+            *error = r.error;
+        return false;
+    }
+    TakeMesh(storedName, r.mesh);
+    m_meshPath = path;
+    return true;
+}
+
+void CDomainKiv::TakeMesh(const CString& storedName, MeshPtr mesh) {
+    if (!mesh)
+        return;
+    m_mesh = std::move(mesh);
+    m_meshPath.clear();
+    m_meshFile = storedName;
+    const MeshExtent& e = m_mesh->Extent();
+    m_xMin = e.xMin, m_xMax = e.xMax, m_yMin = e.yMin, m_yMax = e.yMax;
+    m_zMin = e.zMin, m_zMax = e.zMax;
+    if (!m_mesh->projection.empty())
+        m_projection = m_mesh->projection;
+    const int n = static_cast<int>(m_mesh->boundaries.size());
+    m_boundaries->SetItemCount(n, 1);
+    for (int i = 1; i <= n; ++i) {
+        CBoundaryNameKiv* item = m_boundaries->GetItem(i);
+        item->Identifier(m_mesh->boundaries[static_cast<size_t>(i - 1)].name);
+        item->BoundaryCode(m_mesh->boundaries[static_cast<size_t>(i - 1)].code);
+    }
+    NotifyListeners(kMeshChanged);
+}
+
+MeshPtr CDomainKiv::EnsureMesh(const std::string& path, std::string* error) {
+    if (m_mesh && (m_meshPath.empty() || m_meshPath == path))
+        return m_mesh;
+    if (!MeshExist())
+        return nullptr;
+    MeshReadResult r = ReadMeshFile(path);
+    m_mesh = r.mesh;
+    m_meshPath = path;
+    if (!m_mesh && error)
+        *error = r.error;
+    return m_mesh;
 }
 
 void CDomainKiv::Projection(const CString& p) {
@@ -87,7 +136,10 @@ void CDomainKiv::WriteData(void* h) { WriteFields(h, *this, DomainFields::kField
 
 void CDomainKiv::ReadData(void* h) {
     const int layers1 = m_layers1, layers2 = m_layers2;
+    const CString meshFile = m_meshFile;
     ReadFields(h, *this, DomainFields::kFields);
+    if (m_meshFile != meshFile)
+        m_mesh.reset(), m_meshPath.clear();
     CheckLayerCount(h, "number_of_sigma_layers", m_layers1, layers1);
     CheckLayerCount(h, "number_of_z_layers", m_layers2, layers2);
     NotifyListeners(kMeshChanged);
@@ -117,6 +169,10 @@ int CDomainKiv::ValidateData() {
     return ok;
 }
 
-void CDomainKiv::SetDefault() { DefaultFields(*this, DomainFields::kFields); }
+void CDomainKiv::SetDefault() {
+    DefaultFields(*this, DomainFields::kFields);
+    m_mesh.reset();
+    m_meshPath.clear();
+}
 
 CDomainKiv* Domain(const CZoSEKivBase* node) { return GetImportant<CDomainKiv>(node, "Domain"); }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "FemNotifier.h"
+#include "mesh/Mesh.h"
 #include "setupeditor/ZoSEKivBase.h"
 
 class CBoundaryNamesKiv;
@@ -46,6 +47,19 @@ public:
     const CString& Projection() const { return m_projection; }
     void Projection(const CString& p);
 
+    // The mesh itself, shared by every view that shows it; null until it is read. A setup
+    // read from a file names its mesh, whose geometry is read when a view first needs it.
+    const MeshPtr& Mesh() const { return m_mesh; }
+    // Reads the mesh at path and takes everything from it (TakeMesh); on failure the error
+    // says why and nothing changes.
+    bool LoadMesh(const CString& storedName, const std::string& path, std::string* error);
+    // The mesh file (stored as storedName), extent, projection (when the mesh names one) and
+    // open boundaries from a mesh, the boundary list following through its list operations.
+    void TakeMesh(const CString& storedName, MeshPtr mesh);
+    // The geometry of the mesh already named, read from path (resolved by the caller) once;
+    // the stored extent and boundaries stay as they are. Null with the error when unreadable.
+    MeshPtr EnsureMesh(const std::string& path, std::string* error);
+
     // The open boundaries of the mesh, registered as "BoundaryNames".
     CBoundaryNamesKiv* BoundaryNames() const { return m_boundaries; }
 
@@ -64,6 +78,8 @@ private:
     int m_layers2 = 0;
     CString m_projection;
     CBoundaryNamesKiv* m_boundaries = nullptr;
+    MeshPtr m_mesh;
+    std::string m_meshPath;   // where m_mesh was read from
 };
 
 CDomainKiv* Domain(const CZoSEKivBase* node);

@@ -7,6 +7,7 @@
 #include "core/MudTransportModuleKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "fem/BoundaryNamesKiv.h"
+#include "fem/DomainKiv.h"
 #include "fem/SimulationPeriodKiv.h"
 #include "fem/UnitUtil.h"
 #include "host/ModuleSelection.h"
@@ -264,7 +265,8 @@ TEST_F(EditorTest, BoundariesAndSourcesChangedOnTheirPagesAreFollowed) {
     Table()->item(1, 2)->setText("500000.5");
     EXPECT_EQ(doc.GetSources()->GetItem(2)->X(), 500000.5);
     Table()->item(1, 3)->setText("not a number");
-    EXPECT_EQ(doc.GetSources()->GetItem(2)->Y(), (5916400.0 + 5985900.0) / 2);
+    const MeshInfo extent = doc.GetDomain()->GetMeshInfo();
+    EXPECT_EQ(doc.GetSources()->GetItem(2)->Y(), (extent.yMin + extent.yMax) / 2);
 
     // The module's own lists, where they exist, appear in the tree under the new names.
     if (doc.GetImportantNode("MudTransportBoundaryConditions")) {

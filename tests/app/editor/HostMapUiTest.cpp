@@ -1,0 +1,133 @@
+// The maps of the host's pages in the editor: a click on the map selects the boundary or
+// source in the table and back; a mesh chosen on the domain's page gives the boundaries, and
+// one that cannot be read changes nothing.
+#include "EditorSettings.h"
+#include "EditorWindow.h"
+#include "fem/BoundaryNamesKiv.h"
+#include "fem/DomainKiv.h"
+#include "widgets/GisNavigationDlg.h"
+#include "widgets/ZoPrompts.h"
+
+#include <QFile>
+#include <QPushButton>
+#include <QTableWidget>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include <gtest/gtest.h>
+
+#include <memory>
+
+namespace {
+
+class HostMaps : public ::testing::Test {
+protected:
+    void SetUp() override {
+        ASSERT_TRUE(m_dir.isValid());
+        QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope, m_dir.filePath("settings"));
+        EditorSettings().clear();
+        for (const char* name : {"estuary.setup", "estuary.2dm"})
+            ASSERT_TRUE(QFile::copy(QString(MUD_SOURCE_DIR "/examples/") + name, m_dir.filePath(name)));
+        m_window = std::make_unique<CEditorWindow>();
+        m_window->SetPrompter([](const CEditorWindow::Prompt&) { return QMessageBox::Cancel; });
+        m_window->resize(1280, 800);
+        m_window->show();
+        ASSERT_TRUE(QTest::qWaitForWindowExposed(m_window.get()));
+        ASSERT_TRUE(m_window->OpenFile(m_dir.filePath("estuary.setup")));
+    }
+    void TearDown() override {
+        m_window.reset();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+    CMeshNavigationDlg* MapPage() {
+        auto* page = m_window->CurrentDialog()->findChild<CMeshNavigationDlg*>();
+        EXPECT_NE(page, nullptr);
+        return page;
+    }
+    QTableWidget* Table() { return m_window->CurrentDialog()->findChild<QTableWidget*>(); }
+    // Clicks the middle of feature number n of a layer.
+    void ClickFeature(int overlay, int n) {
+        CZoMapView* map = MapPage()->Map();
+        for (const CZoMapFeature& f : map->Overlay(overlay).features)
+            if (f.number == n) {
+                const QPointF at = f.points[f.points.size() / 2];
+                QTest::mouseClick(map, Qt::LeftButton, {}, map->ToPixel(at.x(), at.y()).toPoint());
+                return;
+            }
+        ADD_FAILURE() << "no feature " << n;
+    }
+
+    QTemporaryDir m_dir;
+    std::unique_ptr<CEditorWindow> m_window;
+};
+
+TEST_F(HostMaps, AClickOnTheMapSelectsTheBoundaryOrSourceAndBack) {
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN/BOUNDARY_NAMES"));
+    CMeshNavigationDlg* page = MapPage();
+    ASSERT_TRUE(page->Map()->Mesh());
+    EXPECT_EQ(page->Map()->Mesh(), m_window->Document().GetDomain()->Mesh());
+    const int boundaries = page->BoundaryOverlay();
+    ASSERT_EQ(page->Map()->Overlay(boundaries).features.size(), 3u);
+    ClickFeature(boundaries, 3);
+    EXPECT_EQ(Table()->currentRow(), 2);
+    Table()->setCurrentCell(1, 0);
+    EXPECT_EQ(page->Map()->Overlay(boundaries).selected, 2);
+    // A renamed boundary is renamed on the map.
+    Table()->item(1, 0)->setText("Elbe");
+    EXPECT_EQ(MapPage()->Map()->Overlay(boundaries).features[1].name, "Elbe");
+
+    ASSERT_TRUE(m_window->SelectPath("HYDRODYNAMIC_SOURCES"));
+    const int sources = MapPage()->SourceOverlay();
+    ASSERT_EQ(MapPage()->Map()->Overlay(sources).features.size(), 2u);
+    ClickFeature(sources, 2);
+    EXPECT_EQ(Table()->currentRow(), 1);
+    Table()->setCurrentCell(0, 0);
+    EXPECT_EQ(MapPage()->Map()->Overlay(sources).selected, 1);
+}
+
+TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNothing) {
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN"));
+    QFile other(m_dir.filePath("other.2dm"));
+    ASSERT_TRUE(other.open(QIODevice::WriteOnly));
+    other.write("MESH2D\nE3T 1 1 2 3 1\nND 1 500000 5950000 -3\nND 2 501000 5950000 -4\n"
+                "ND 3 501000 5951000 -2\nNS 1 -2 7 Harbour mouth\n");
+    other.close();
+    QFile bad(m_dir.filePath("bad.2dm"));
+    ASSERT_TRUE(bad.open(QIODevice::WriteOnly));
+    bad.write("MESH2D\nE3T 1 1 2 3 1\n");
+    bad.close();
+
+    QString chosen;
+    const ZoOpenFileHook previous = ZoSetOpenFileHook(
+        [&](QWidget*, const QString&, const QString&, const QString&) { return chosen; });
+    QStringList messages;
+    const ZoMessageSink sink = ZoSetMessageSink([&](QWidget*, const QString& text) { messages << text; });
+    QPushButton* browse = nullptr;
+    for (QPushButton* b : m_window->CurrentDialog()->findChildren<QPushButton*>())
+        if (b->text() == "Browse...")
+            browse = b;
+    ASSERT_NE(browse, nullptr);
+
+    CDomainKiv* domain = m_window->Document().GetDomain();
+    chosen = m_dir.filePath("bad.2dm");
+    browse->click();
+    ASSERT_EQ(messages.size(), 1);
+    EXPECT_TRUE(messages[0].endsWith("bad.2dm: no nodes (ND)")) << messages[0].toStdString();
+    EXPECT_EQ(domain->MeshFile(), "estuary.2dm");
+    EXPECT_EQ(domain->BoundaryNames()->GetItemCount(), 3);
+
+    chosen = m_dir.filePath("other.2dm");
+    browse->click();
+    EXPECT_EQ(messages.size(), 1);
+    EXPECT_EQ(domain->MeshFile(), "other.2dm");  // beside the setup: stored relative to it
+    ASSERT_EQ(domain->BoundaryNames()->GetItemCount(), 1);
+    EXPECT_EQ(domain->BoundaryNames()->GetItem(1)->Identifier(), "Harbour mouth");
+    EXPECT_EQ(domain->GetMeshInfo().xMax, 501000.0);
+    EXPECT_EQ(MapPage()->Map()->Mesh(), domain->Mesh());
+    EXPECT_TRUE(m_window->IsModified());
+
+    ZoSetOpenFileHook(previous);
+    ZoSetMessageSink(sink);
+}
+
+}  // namespace
