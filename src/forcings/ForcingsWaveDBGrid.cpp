@@ -3,6 +3,7 @@
 #include "ForcingsWaveDBAxisKiv.h"
 #include "ForcingsWaveDBFile.h"
 #include "ForcingsWaveDBListKiv.h"
+#include "widgets/ZoFileSelectorDlg.h"
 
 #include <algorithm>
 
@@ -88,7 +89,9 @@ int CForcingsWaveDBGrid::StoreItem(CForcingsWaveDBItemKiv* item, int, int col,
 }
 
 void CForcingsWaveDBGrid::OnClickedButtonRowCol(int row, int col) {
-    if (col != kSelectColumn)
+    CForcingsWaveDBItemKiv* item = col == kSelectColumn ? GetItem(row) : nullptr;
+    if (!item || !ZoSelectDataFile(item->File(), kFilter, kDefaultExt, this))
         return;
-    (void)row;  // the file selector is wired here once it is there
+    Redraw();
+    UpdateDoc(kHintValueChanged);
 }

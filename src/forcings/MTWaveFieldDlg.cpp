@@ -2,6 +2,8 @@
 
 #include "MTWaveFieldFile.h"
 #include "MTWaveFieldKiv.h"
+#include "widgets/FemBase.h"
+#include "widgets/ZoFileSelectorDlg.h"
 #include "widgets/ZoNumberEdit.h"
 #include "widgets/ZoSEDlgBase.h"
 
@@ -207,7 +209,22 @@ void CMTWaveFieldDlg::OnFileNameEdited() {
 }
 
 void CMTWaveFieldDlg::OnSelect() {
-    // Wired to the file selector once it is there.
+    CMTWaveFieldFile* file = m_field->File();
+    const FileChoice choice = FileChoiceFor(m_format->currentIndex(), file->FileName());
+    if (!ZoSelectDataFile(file, choice.filter, choice.defaultExt, this))
+        return;
+    // Three items whatever the selector handed back (a stored format 2 asks for none).
+    file->SetNoItems(CMTWaveFieldFile::kItems);
+    const CZoFileSelector names = file->MakeFileSelector();
+    for (int i = 1; i <= CMTWaveFieldFile::kItems; ++i)
+        file->ItemName(i, names.GetNameOfItem(file->ItemNumber(i)));
+    Changed();
+    SetData();
 }
 
-void CMTWaveFieldDlg::OnView() {}
+void CMTWaveFieldDlg::OnView() {
+    const CMTWaveFieldFile* file = m_field->File();
+    if (!m_owner || file->FileName().empty())
+        return;
+    CFemBase::OpenDataFile(m_owner, file->FileName(), file->ItemNumber());
+}

@@ -14,13 +14,10 @@ constexpr int kExitError = 2;
 
 // new, validate, format, show.
 void AddSetupCommands(CLI::App& app, int& status);
-<<<<<<< HEAD
 // datafile info, datafile new.
 void AddDatafileCommands(CLI::App& app, int& status);
-=======
 // mesh info.
 void AddMeshCommands(CLI::App& app, int& status);
->>>>>>> mesh
 
 // A subcommand whose help is the hand-written text, printed as it stands by --help and
 // after a usage error.

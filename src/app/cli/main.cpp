@@ -16,13 +16,10 @@ const char* const kUsage =
     "  format FILE [-o FILE]                        load and save again in the canonical\n"
     "                                               form (in place without -o; -o - prints it)\n"
     "  show FILE                                    the navigation tree, one node a line\n"
-<<<<<<< HEAD
     "  datafile info FILE | new KIND ...            inspect or make a data file (.qrd0, .qrd1,\n"
     "                                               .qrd2, .qrdu, .kx0, .kx2, .xyz)\n"
-=======
     "  mesh info FILE                               a mesh's counts, extent and open\n"
     "                                               boundaries (.2dm, UGRID .nc)\n"
->>>>>>> mesh
     "\n"
     "A file that cannot be read or has a syntax error exits 2 with FILE:LINE:COLUMN.\n"
     "Every command answers --help.\n";
@@ -34,11 +31,8 @@ int main(int argc, char** argv) {
     CLI::App app(kUsage, "mudsetup");
     app.require_subcommand(1);
     cli::AddSetupCommands(app, status);
-<<<<<<< HEAD
     cli::AddDatafileCommands(app, status);
-=======
     cli::AddMeshCommands(app, status);
->>>>>>> mesh
     cli::AddCommand(app, "help", kUsage)->group("")->callback([] { std::cout << kUsage; });
     return cli::Run(app, argc, argv, status);
 }
