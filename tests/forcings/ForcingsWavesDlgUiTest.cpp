@@ -110,8 +110,9 @@ TEST(ForcingsWavesDlg, EachTypeShowsItsSubFormAndTheSettings) {
         form->SetData();
         EXPECT_EQ(form->TypeBox()->currentData().toInt(), c.type);
         EXPECT_EQ(form->SubForms()->isVisible(), c.subForm != nullptr);
-        if (c.subForm)
+        if (c.subForm) {
             EXPECT_EQ(form->SubForms()->currentWidget(), c.subForm);
+        }
         const bool settings = c.type != 0;
         EXPECT_EQ(form->LiquefactionBox()->isVisible(), settings);
         EXPECT_EQ(form->LiquefactionFactorEdit()->isVisible(), settings);
@@ -196,7 +197,9 @@ TEST(MTWaveFieldDlg, FormatSwitchesBetweenConstantsAndFile) {
         const char* entry;
         int format;
     };
-    for (const Case& c : {Case{"Varying in time and domain", 3},
+    // One step of the arrow keys each.
+    for (const Case& c : {Case{"Varying in time, constant in domain", 1},
+                          Case{"Varying in time and domain", 3},
                           Case{"Varying in time, constant in domain", 1}, Case{"Constant", 0}}) {
         SCOPED_TRACE(c.entry);
         host.Clear();
