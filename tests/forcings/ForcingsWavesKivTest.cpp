@@ -1,4 +1,5 @@
 #include "ForcingsTestSupport.h"
+#include "forcings/MTWaveFieldFile.h"
 
 using namespace testsupport;
 using namespace forcingstest;
@@ -155,4 +156,16 @@ TEST(ForcingsWavesKiv, NavigationShowsWavesBelowForcings) {
     EXPECT_EQ(w->WaveField()->GetDlgRuntimeClass(kDlgRuntimeClassRequest), nullptr);
     EXPECT_EQ(w->WaveDatabase()->GetDlgRuntimeClass(kDlgRuntimeClassRequest), nullptr);
     EXPECT_EQ(WaveFieldSection(doc.Module()), w->WaveField());
+}
+
+TEST(ForcingsWavesKiv, BundledExampleTakesItsWavesFromATimeSeries) {
+    CSetupDocument::OpenResult opened =
+        CSetupDocument::Open(std::string(MUD_SOURCE_DIR) + "/examples/estuary.setup");
+    ASSERT_TRUE(opened.document);
+    const CSetupDocument& doc = *opened.document;
+    EXPECT_EQ(Waves(doc)->WaveType(), CForcingsWavesKiv::kWaveField);
+    EXPECT_EQ(Field(doc)->GetFormat(), CMTWaveFieldKiv::kTimeSeries);
+    EXPECT_EQ(Field(doc)->File()->FileName(), "data/waves_mouth.qrd0");
+    EXPECT_TRUE(Field(doc)->File()->CheckFile());
+    EXPECT_EQ(Field(doc)->File()->ItemName(1), "height");
 }
