@@ -88,13 +88,25 @@ void CForcingsWaveDBListKiv::ResizeToAxes() {
 }
 
 void CForcingsWaveDBListKiv::Load(void* h) {
+    m_storedCount.reset();
     CZoSEKivListBase::Load(h);
     ResizeToAxes();
+    if (m_storedCount && *m_storedCount != GetItemCount())
+        kivWarn(m_storedCountSection, "ZoSEKivListItemCount",
+                FormatString("item count %d does not match the %d points of the axes; the axes "
+                             "hold",
+                             *m_storedCount, GetItemCount()));
+    m_storedCount.reset();
+    m_storedCountSection = nullptr;
 }
 
 void CForcingsWaveDBListKiv::LoadSize(void* h) {
-    // Looked up so that it counts as read.
-    kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1);
+    if (!kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1))
+        return;
+    int n = GetItemCount();
+    kivGetParam(h, "ZoSEKivListItemCount", &n, 1, 1);
+    m_storedCount = n;
+    m_storedCountSection = h;
 }
 
 void CForcingsWaveDBListKiv::WriteData(void* h) {

@@ -4,6 +4,7 @@
 #include "setupeditor/ZoSEKivListBase.h"
 
 #include <cstdint>
+#include <optional>
 
 class CForcingsWaveDBAxisKiv;
 class CForcingsWaveDBWindSpeedKiv;
@@ -62,4 +63,7 @@ private:
     CForcingsWaveDBWindDirectionKiv* m_direction;
     CForcingsWaveDBWaterLevelKiv* m_level;
     Shape m_shape;  // the one the items are laid out for
+    // The count a file gave, checked against the axes once the section is read.
+    std::optional<int> m_storedCount;
+    void* m_storedCountSection = nullptr;
 };

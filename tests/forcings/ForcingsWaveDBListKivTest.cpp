@@ -137,6 +137,21 @@ TEST(ForcingsWaveDBListKiv, CountsFromAFileNeitherLoopNorAllocateWithoutBound) {
     }
 }
 
+TEST(ForcingsWaveDBListKiv, StoredCountThatDisagreesWithTheAxesIsReported) {
+    CSetupDocument::OpenResult r = CSetupDocument::FromText(
+        DatabaseText("ZoSEKivListItemCount = 7\nWIND_SPEED {\nnumber_of_wind_speeds = 2\n}"),
+        "test.setup");
+    ASSERT_TRUE(r.document);
+    EXPECT_EQ(Database(*r.document)->GetItemCount(), 2);
+    ASSERT_EQ(r.warnings.size(), 1u);
+    EXPECT_EQ(r.warnings[0].pos.line, 5);
+    EXPECT_NE(r.warnings[0].message.find("item count 7 does not match the 2 points"),
+              std::string::npos);
+    // What the module writes reads back without a word.
+    CSetupDocument::OpenResult again = CSetupDocument::FromText(r.document->ToText(), "t.setup");
+    EXPECT_TRUE(again.warnings.empty());
+}
+
 TEST(ForcingsWaveDBListKiv, ZeroIncrementCollapsesAnAxisButKeepsItsCount) {
     auto doc = Load(DatabaseText(R"(
 WIND_DIRECTION {

@@ -21,6 +21,7 @@
 
 #include <QApplication>
 #include <QCheckBox>
+#include <QDir>
 #include <QFile>
 #include <QImage>
 #include <QLabel>
@@ -76,10 +77,15 @@ protected:
         CUnitUtil::ResetUserUnits();
     }
 
-    // A copy of the example in the test's folder, so that saving never touches the original.
+    // A copy of the example in the test's folder, so that saving never touches the original;
+    // the data files it names go beside it, as they lie beside the original.
     QString CopyOfExample(const QString& name = "estuary.setup") {
         const QString path = m_dir.filePath(name);
         EXPECT_TRUE(WriteAll(path, ReadAll(kExample)));
+        const QDir data(QStringLiteral(MUD_SOURCE_DIR "/examples/data"));
+        QDir(m_dir.path()).mkpath("data");
+        for (const QString& f : data.entryList(QDir::Files))
+            QFile::copy(data.filePath(f), m_dir.filePath("data/" + f));
         return path;
     }
 
