@@ -35,7 +35,7 @@ CForcingsWaveDBDlg::CForcingsWaveDBDlg(CForcingsWaveDBListKiv* list, CZoSEDlgBas
         for (int c = 0; c < 3; ++c) {
             auto* edit = c < 2 ? new CZoNumberEdit(
                                      CZoEditStyle().SetOvuUnitBaseGroup(rows[a].group), frame)
-                               : new CZoNumberEdit(frame);
+                               : new CZoNumberEdit(CZoEditStyle().SetMinimum(0), frame);
             edit->setObjectName(QString("%1%2").arg(rows[a].name, parts[c]));
             grid->addWidget(edit, a + 1, c + 1);
             m_edits[a][c] = edit;

@@ -5,8 +5,6 @@
 #include "paramfile/Kiv.h"
 
 #include <algorithm>
-#include <map>
-#include <tuple>
 
 namespace {
 const char* const kItemNumberKeywords[] = {"item_number_for_wave_height",
@@ -62,11 +60,9 @@ void CForcingsWaveDBListKiv::ResizeToAxes() {
     const int count = PointCount(shape);
     if (shape == m_shape && count == GetItemCount())
         return;
-    struct Chosen {
-        CString fileName;
-        std::vector<int> items;
-    };
-    std::map<std::tuple<int, int, int>, Chosen> chosen;
+    // What every point holds now, with what earlier resizes parked.
+    std::map<std::tuple<int, int, int>, Chosen> chosen = std::move(m_parked);
+    m_parked.clear();
     for (int k = 1; k <= GetItemCount(); ++k) {
         const Point p = PointOf(k, m_shape);
         const CForcingsWaveDBFile* f = GetItem(k)->File();
@@ -79,11 +75,16 @@ void CForcingsWaveDBListKiv::ResizeToAxes() {
         auto it = chosen.find({p.speed, p.direction, p.level});
         if (it == chosen.end()) {
             f->SetDefault();
-        } else {
-            f->FileName(it->second.fileName);
-            f->ItemNumber(it->second.items);
+            continue;
         }
+        f->FileName(it->second.fileName);
+        f->ItemNumber(it->second.items);
+        chosen.erase(it);
     }
+    // Only points that hold a file are worth keeping.
+    for (auto& [point, c] : chosen)
+        if (!c.fileName.empty())
+            m_parked.emplace(point, std::move(c));
     m_shape = shape;
 }
 
@@ -121,6 +122,7 @@ void CForcingsWaveDBListKiv::WriteData(void* h) {
 }
 
 void CForcingsWaveDBListKiv::ReadData(void* h) {
+    m_parked.clear();  // the file says which points there are
     for (CForcingsWaveDBAxisKiv* axis :
          std::initializer_list<CForcingsWaveDBAxisKiv*>{m_speed, m_direction, m_level})
         if (void* s = kivSectionByNameNum(h, axis->GetSectionName().c_str(), 1))

@@ -4,6 +4,9 @@
 #include "setupeditor/ZoSEKivListBase.h"
 
 #include <cstdint>
+#include <map>
+#include <tuple>
+#include <vector>
 #include <optional>
 
 class CForcingsWaveDBAxisKiv;
@@ -47,7 +50,8 @@ public:
     bool AxesValid() const;
 
     // Sizes the list to the axes. Each file stays with the speed, direction and level it was
-    // chosen for; points that are new start empty.
+    // chosen for; points that drop out keep theirs until the setup is read again, so that an
+    // axis cut and restored in the form brings them back. New points start empty.
     void ResizeToAxes();
 
     void Load(void* h) override;
@@ -63,6 +67,11 @@ private:
     CForcingsWaveDBWindDirectionKiv* m_direction;
     CForcingsWaveDBWaterLevelKiv* m_level;
     Shape m_shape;  // the one the items are laid out for
+    struct Chosen {
+        CString fileName;
+        std::vector<int> items;
+    };
+    std::map<std::tuple<int, int, int>, Chosen> m_parked;  // by speed, direction, level
     // The count a file gave, checked against the axes once the section is read.
     std::optional<int> m_storedCount;
     void* m_storedCountSection = nullptr;

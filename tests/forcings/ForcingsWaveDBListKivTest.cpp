@@ -265,6 +265,16 @@ TEST(ForcingsWaveDBListKiv, FilesStayWithTheirPointWhenAnAxisChanges) {
     ASSERT_EQ(db->GetItemCount(), 2);
     EXPECT_EQ(fileOf(1), name(1, 1, 1));
     EXPECT_EQ(fileOf(2), name(1, 2, 1));
+    EXPECT_EQ(PointSections(doc).size(), 2u);
+
+    SetAxes(db, 0, 2, 1);  // nothing left...
+    EXPECT_EQ(db->GetItemCount(), 0);
+    SetAxes(db, 2, 2, 1);  // ...and the points come back with their files
+    for (int k = 1; k <= 4; ++k) {
+        const auto p = CForcingsWaveDBListKiv::PointOf(k, db->CurrentShape());
+        EXPECT_EQ(fileOf(k), name(p.speed, p.direction, p.level));
+    }
+    EXPECT_EQ(db->GetItem(4)->File()->ItemNumber(), (std::vector<int>{6, 5, 4}));
 }
 
 TEST(ForcingsWaveDBFile, FilesAreCheckedOnlyForTheDatabaseType) {

@@ -362,6 +362,16 @@ TEST(ForcingsWaveDBDlg, AxesResizeTheGridAndSendTheirHints) {
     EXPECT_EQ(bedtest::RowTexts(grid, 2)[3], "-0.5");
     EXPECT_EQ(host.hints, (std::vector<int>{4, 1}));
 
+    // A negative count is refused where it is typed.
+    {
+        MessageRecorder messages;
+        host.Clear();
+        Enter(db->CountEdit(2), "-1");
+        EXPECT_EQ(messages.Messages().size(), 1u);
+        EXPECT_EQ(Database(doc)->WaterLevel()->Count(), 2);
+        EXPECT_TRUE(host.hints.empty());
+    }
+
     // A zero wind-speed increment is out of range: no rows, the items stay.
     Enter(db->IncrementEdit(0), "0");
     EXPECT_EQ(grid->GetRowCount(), 0);
