@@ -57,8 +57,8 @@ fuzz-ci: build/fuzz/build.ninja
 	mkdir -p build/fuzz/corpus
 	mkdir -p build/fuzz/corpus-setup
 	mkdir -p build/fuzz/corpus-mesh
-	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus fuzz/corpus
-	build/fuzz/fuzz/setup_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-setup fuzz/corpus-setup
+	build/fuzz/fuzz/paramfile_fuzz -max_total_time=60 -rss_limit_mb=2048 -max_len=16384 build/fuzz/corpus fuzz/corpus
+	build/fuzz/fuzz/setup_fuzz -max_total_time=60 -rss_limit_mb=2048 -max_len=65536 build/fuzz/corpus-setup fuzz/corpus-setup
 	build/fuzz/fuzz/mesh_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-mesh fuzz/corpus-mesh
 	mkdir -p build/fuzz/corpus-datafile
 	build/fuzz/fuzz/datafile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-datafile fuzz/corpus-datafile

@@ -1,5 +1,5 @@
 // Any text as a setup: it loads or is refused, never crashes; what is saved loads again to
-// the same setup, so a second save writes the same text.
+// the same setup, so a second save writes the same text, and every entry saved is read.
 #include "host/SetupDocument.h"
 
 #include <cstdint>
@@ -17,6 +17,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     CSetupDocument::OpenResult second = CSetupDocument::FromText(saved, "saved.setup");
     if (!second.document) {
         std::fprintf(stderr, "a saved setup does not load: %s\n", second.error->ToString().c_str());
+        std::abort();
+    }
+    if (!second.document->DroppedOnSave().empty()) {
+        std::fprintf(stderr, "a saved setup holds what it does not read: %s\n",
+                     second.document->DroppedOnSave().front().ToString().c_str());
         std::abort();
     }
     if (second.document->ToText() != saved) {

@@ -17,7 +17,7 @@ constexpr long kConcentrationGroup = 100403;
 
 CMTErosionListDlg::CMTErosionListDlg(QWidget* parent)
     : CZoSEDlgBase(parent), m_maxConcentration(new CZoNumberEdit(
-                                CZoEditStyle().SetOvuUnitBaseGroup(kConcentrationGroup), this)),
+                                CZoEditStyle().SetOvuUnitBaseGroup(kConcentrationGroup).SetFloatRange(), this)),
       m_unit(new QLabel(this)), m_grid(new CMTErosionGrid(this)) {
     HelpID(5027);
     m_maxConcentration->setObjectName("maxConcentration");

@@ -15,7 +15,7 @@ IMPLEMENT_DYNCREATE_DLG(CMTMorphologyDlg)
 CMTMorphologyDlg::CMTMorphologyDlg(QWidget* parent)
     : CZoSEDlgBase(parent), m_include(new QCheckBox("Include Morphological calculations", this)),
       m_speedup(new QCheckBox("Apply speedup factor", this)),
-      m_factorLabel(new QLabel("Speedup factor", this)), m_factor(new CZoNumberEdit(this)) {
+      m_factorLabel(new QLabel("Speedup factor", this)), m_factor(new CZoNumberEdit(CZoEditStyle().SetFloatRange(), this)) {
     HelpID(5029);
     m_include->setObjectName("includeMorphologicalUpdate");
     m_speedup->setObjectName("applySpeedup");

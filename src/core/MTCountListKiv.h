@@ -32,7 +32,50 @@ public:
 
     MTCount Follows() const { return m_follows; }
 
+    // The file's own count is applied, so that nothing it holds is lost, but one that
+    // disagrees with the model definition is reported here and by validation.
+    void LoadSize(void* h) override {
+        CZoSEKivListBase<T>::LoadSize(h);
+        if (this->GetSectionNamePattern().empty() ||
+            !kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1))
+            return;
+        const int expected = CurrentCount(ModelDefinition(this));
+        if (this->GetItemCount() != expected)
+            kivWarn(h, "ZoSEKivListItemCount",
+                    FormatString("ZoSEKivListItemCount = %d, but the setup has %s",
+                                 this->GetItemCount(), Expectation().c_str()));
+    }
+
+    int Validate() override {
+        int ok = CZoSEKivListBase<T>::Validate();
+        const int count = this->GetItemCount();
+        if (count != CurrentCount(ModelDefinition(this))) {
+            this->AddError(FormatString("%d item%s, but the setup has %s", count,
+                                        count == 1 ? "" : "s", Expectation().c_str()));
+            ok = 0;
+        }
+        return ok;
+    }
+
 private:
+    // "2 fractions", "3 layers (2 transitions)".
+    CString Expectation() const {
+        const CParameterSelectionKiv* model = ModelDefinition(this);
+        auto counted = [](int n, const char* what) {
+            return FormatString("%d %s%s", n, what, n == 1 ? "" : "s");
+        };
+        switch (m_follows) {
+        case MTCount::Fractions:
+            return counted(model->NumberOfFractions(), "fraction");
+        case MTCount::Layers:
+            return counted(model->NumberOfLayers(), "layer");
+        case MTCount::LayerPairs:
+            return counted(model->NumberOfLayers(), "layer") + " (" +
+                   counted(CurrentCount(model), "transition") + ")";
+        }
+        return "";
+    }
+
     int CurrentCount(const CParameterSelectionKiv* model) const {
         switch (m_follows) {
         case MTCount::Fractions:

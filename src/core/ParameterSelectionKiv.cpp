@@ -2,6 +2,8 @@
 
 #include "paramfile/Kiv.h"
 
+#include <cstring>
+
 namespace {
 const char* const kKey = "MT Task Selection";
 
@@ -36,24 +38,56 @@ void CParameterSelectionKiv::NumberOfLayers(int n) {
     NotifyListeners(kNotifyLayers);
 }
 
+namespace {
+// Constants of the simulation engine, written ahead of the model definition.
+struct EngineConstant {
+    const char* section;
+    const char* keyword;
+    int value;
+};
+const EngineConstant kEngineConstants[] = {
+    {"EQUATION", "formulation", 4},
+    {"TIME", "start_time_step", 0},
+    {"TIME", "time_step_factor", 1},
+    {"SPACE", "number_of_2D_mesh_geometry", 1},
+    {"SPACE", "number_of_2D_mesh_velocity", 1},
+    {"SPACE", "number_of_2D_mesh_concentration", 1},
+    {"SPACE", "number_of_3D_mesh_geometry", 2},
+    {"SPACE", "number_of_3D_mesh_velocity", 2},
+    {"SPACE", "number_of_3D_mesh_concentration", 2},
+};
+}  // namespace
+
 void CParameterSelectionKiv::Save(void* h) {
-    // Constants of the simulation engine, written ahead of the model definition.
-    kivAddSection(h, "EQUATION");
-    kivPutParam(h, "formulation", 4);
-    kivEndSection(h);
-    kivAddSection(h, "TIME");
-    kivPutParam(h, "start_time_step", 0);
-    kivPutParam(h, "time_step_factor", 1);
-    kivEndSection(h);
-    kivAddSection(h, "SPACE");
-    kivPutParam(h, "number_of_2D_mesh_geometry", 1);
-    kivPutParam(h, "number_of_2D_mesh_velocity", 1);
-    kivPutParam(h, "number_of_2D_mesh_concentration", 1);
-    kivPutParam(h, "number_of_3D_mesh_geometry", 2);
-    kivPutParam(h, "number_of_3D_mesh_velocity", 2);
-    kivPutParam(h, "number_of_3D_mesh_concentration", 2);
+    const char* open = nullptr;
+    for (const EngineConstant& c : kEngineConstants) {
+        if (!open || std::strcmp(open, c.section) != 0) {
+            if (open)
+                kivEndSection(h);
+            kivAddSection(h, c.section);
+            open = c.section;
+        }
+        kivPutParam(h, c.keyword, c.value);
+    }
     kivEndSection(h);
     CZoSEKivBase::Save(h);
+}
+
+void CParameterSelectionKiv::Load(void* h) {
+    // The constants are read only to say so when a file holds other values: they are
+    // written as they are whatever the file held.
+    for (const EngineConstant& c : kEngineConstants) {
+        void* s = kivSectionByNameNum(h, c.section, 1);
+        if (!s || !kivKeywordByNameNum(s, c.keyword, 1))
+            continue;
+        int value = c.value;
+        kivGetParam(s, c.keyword, &value, 1, 1);
+        if (value != c.value)
+            kivWarn(s, c.keyword,
+                    FormatString("%s = %d is a constant of the engine; saved as %d", c.keyword,
+                                 value, c.value));
+    }
+    CZoSEKivBase::Load(h);
 }
 
 void CParameterSelectionKiv::WriteData(void* h) {

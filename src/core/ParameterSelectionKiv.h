@@ -23,6 +23,7 @@ public:
     void NumberOfLayers(int n);
 
     void Save(void* h) override;
+    void Load(void* h) override;
     void WriteData(void* h) override;
     void ReadData(void* h) override;
     int ValidateData() override;

@@ -15,11 +15,11 @@ CMTDensityFeedbackDlg::CMTDensityFeedbackDlg(QWidget* parent) : CZoSEDlgBase(par
     auto* grid = new QGridLayout;
     m_density =
         mtdlg::NumberRow(grid, 0, "Density of Suspended Sediment",
-                         CZoEditStyle().SetOvuUnitBaseGroup(100017), "sedimentDensity", this);
+                         CZoEditStyle().SetOvuUnitBaseGroup(100017).SetFloatRange(), "sedimentDensity", this);
     m_base = mtdlg::NumberRow(grid, 1, "Base in Viscosity Formula",
-                              CZoEditStyle().SetOvuUnitBaseGroup(100144), "viscosityBase", this);
+                              CZoEditStyle().SetOvuUnitBaseGroup(100144).SetFloatRange(), "viscosityBase", this);
     m_concentration = mtdlg::NumberRow(grid, 2, "Concentration in Viscosity Formula",
-                                       CZoEditStyle().SetOvuUnitBaseGroup(100403),
+                                       CZoEditStyle().SetOvuUnitBaseGroup(100403).SetFloatRange(),
                                        "viscosityConcentration", this);
     grid->setColumnStretch(3, 1);
     auto* layout = new QVBoxLayout(this);

@@ -13,8 +13,7 @@ bool ModelIs3D(const CZoSEKivBase* node) {
 
 int EddyViscosityFormatCode(const CZoSEKivBase* node) { return ModelIs3D(node) ? 3 : 2; }
 
-// A value's section: the constant goes under its own keyword; the file selection keeps
-// only its first item number.
+// A value's section: the constant goes under its own keyword, as a float.
 void WriteValue(void* h, const char* section, const char* constantKeyword,
                 const CFemInDataKiv& value) {
     const CFemInDataFile& file = *value.QrdData();
@@ -22,7 +21,11 @@ void WriteValue(void* h, const char* section, const char* constantKeyword,
     kivPutParam(h, "format", value.Format());
     kivPutParam(h, constantKeyword, ToFileFloat(value.Constant()));
     kivPutParamFilename(h, "file_name", file.FileName());
-    kivPutParam(h, "item_number", file.ItemNumbers().empty() ? 1 : file.ItemNumbers().front());
+    kivAddKeyword(h, "item_number");
+    if (file.ItemNumbers().empty())
+        kivAddInt(h, 1);
+    for (int n : file.ItemNumbers())
+        kivAddInt(h, n);
     kivPutParam(h, "item_name", file.ItemString());
     kivEndSection(h);
 }
@@ -35,21 +38,33 @@ void ReadValue(void* h, const char* section, const char* constantKeyword, int mi
     if (!s)
         return;
     int format = missingFormat;
-    double constant = 0.0;
+    // A constant the file holds but cannot be used keeps the value's own.
+    double constant = kivKeywordByNameNum(s, constantKeyword, 1) ? value.Constant() : 0.0;
     CString fileName;
-    int itemNumber = 1;
+    std::vector<int> items;
     CString itemName;
     kivGetParam(s, "format", &format, 1, 1);
-    kivGetParam(s, constantKeyword, &constant, 1, 1);
+    ReadFileFloat(s, constantKeyword, &constant);
     kivGetParamFilename(s, "file_name", &fileName, 1, 1);
-    kivGetParam(s, "item_number", &itemNumber, 1, 1);
+    const int count = kivParamCount(kivKeywordByNameNum(s, "item_number", 1));
+    for (int i = 1; i <= count; ++i) {
+        int item = 1;
+        kivGetParam(s, "item_number", &item, 1, i);
+        items.push_back(item);
+    }
+    if (items.empty())
+        items.push_back(1);
     kivGetParam(s, "item_name", &itemName, 1, 1);
     value.Format(format);
     value.Constant(constant);
     CFemInDataFile& file = *value.QrdData();
     file.FileName(fileName);
-    file.ItemNumbers({itemNumber});
-    file.ItemName(itemName);
+    file.ItemNumbers(std::move(items));
+    // The name written for an item without one is its numbers; that is no name.
+    file.ItemName("");
+    if (itemName != file.ItemString())
+        file.ItemName(itemName);
+    value.WarnUnlessFormatAllowed(s);
 }
 
 }  // namespace
@@ -72,6 +87,8 @@ CMTDispersionItemKiv::CMTDispersionItemKiv(CZoSEKivBase* parent)
                                                     false, false, 0.01, 100153, this)) {
     m_eddyViscosity->QrdData()->ItemNumbers({1});
     m_coefficient->QrdData()->ItemNumbers({1});
+    m_eddyViscosity->ConstantIsFloat(true);
+    m_coefficient->ConstantIsFloat(true);
 }
 
 CMTDispersionItemKiv::~CMTDispersionItemKiv() = default;
@@ -107,6 +124,7 @@ void CMTDispersionItemKiv::WriteData(void* h) {
 }
 
 void CMTDispersionItemKiv::ReadData(void* h) {
+    UpdateFormatCode();
     ReadFields(h, *this, DispersionItemFields::kFields);
     WarnUnknownChoice(h, "type", m_type, kNoDispersion, kScaledEddyViscosity);
     ReadValue(h, "SCALED_EDDY_VISCOSITY", "sigma", 0, *m_eddyViscosity);

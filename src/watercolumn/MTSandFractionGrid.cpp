@@ -32,7 +32,7 @@ private:
 };
 
 CZoEditStyle VelocityStyle() {
-    return CZoEditStyle().SetOvuUnitBaseGroup(kSettlingVelocityUnit).SetFormat("%.11g");
+    return CZoEditStyle().SetOvuUnitBaseGroup(kSettlingVelocityUnit).SetFormat("%.11g").SetFloatRange();
 }
 } // namespace
 

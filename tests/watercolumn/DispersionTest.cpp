@@ -216,3 +216,33 @@ TEST(Dispersion, UnknownTypeIsKeptWithAWarning) {
     EXPECT_EQ(item->FormulationType(), 7);
     EXPECT_EQ(item->FormulationText(), "");
 }
+
+TEST(Dispersion, ItemNumbersAndNamesStayInStep) {
+    // A new setup writes the numbers as the name; reading that back is no name.
+    auto fresh = NewSetup(1);
+    auto reread = Load(fresh->ToText());
+    CFemInDataFile* file =
+        Dispersion(*reread)->Horizontal()->GetItem(1)->DispersionCoefficient()->QrdData();
+    EXPECT_EQ(file->ItemName(), "");
+
+    // Every number the form accepts is written and read back, the name follows them.
+    file->ItemNumbers({3, 5});
+    auto saved = Saved(*reread);
+    const auto* k = Find(*saved, {"MUD_TRANSPORT_MODULE", "DISPERSION", "HORIZONTAL_DISPERSION",
+                                  "SSC_FRACTION_1", "DISPERSION_COEFFICIENT"});
+    ASSERT_NE(k, nullptr);
+    EXPECT_EQ(Int(*k, "item_number", 0), 3);
+    EXPECT_EQ(Int(*k, "item_number", 1), 5);
+    EXPECT_EQ(String(*k, "item_name"), "3, 5");
+    auto again = Load(reread->ToText());
+    const CFemInDataFile* back =
+        Dispersion(*again)->Horizontal()->GetItem(1)->DispersionCoefficient()->QrdData();
+    EXPECT_EQ(back->ItemNumbers(), (std::vector<int>{3, 5}));
+    EXPECT_EQ(back->ItemName(), "");
+
+    // A real name stays.
+    auto named = Load(DispersionText("    DISPERSION_COEFFICIENT {\n     item_number = 2\n"
+                                     "     item_name = \"K\"\n    }\n"));
+    EXPECT_EQ(Dispersion(*named)->Horizontal()->GetItem(1)->DispersionCoefficient()->QrdData()->ItemName(),
+              "K");
+}

@@ -23,11 +23,15 @@ const char* const kNewHelp =
 const char* const kValidateHelp =
     "usage: mudsetup validate FILE\n"
     "Validates the setup and prints one line per message, \"PATH: message\".\n"
-    "Exit status: 0 valid, 1 invalid, 2 unreadable or syntax error.\n";
+    "Exit status: 0 valid, 1 invalid, 2 unreadable or syntax error.\n"
+    "Warnings on reading (content no node reads, values that cannot be used, counts\n"
+    "that disagree) make the file invalid: exit 0 means the file holds what it says.\n";
 const char* const kFormatHelp =
-    "usage: mudsetup format FILE [-o FILE]\n"
+    "usage: mudsetup format FILE [-o FILE] [--force]\n"
     "Loads the setup and saves it again in the canonical form: in place, to the file\n"
-    "given with -o, or to standard output with -o -.\n";
+    "given with -o, or to standard output with -o -.\n"
+    "When saving would drop content that reading reported (unknown keywords or\n"
+    "sections), nothing is written and the exit status is 1; --force writes anyway.\n";
 const char* const kShowHelp =
     "usage: mudsetup show FILE\n"
     "Prints the module's navigation tree, one node a line, indented two spaces a level;\n"
@@ -45,13 +49,15 @@ void PrintWarnings(const std::vector<paramfile::Diagnostic>& warnings) {
 }
 
 // Opens a setup, reporting failure as the commands must; null on failure.
-std::unique_ptr<CSetupDocument> OpenOrReport(const std::string& path) {
+std::unique_ptr<CSetupDocument> OpenOrReport(const std::string& path, size_t* warnings = nullptr) {
     CSetupDocument::OpenResult opened = CSetupDocument::Open(path);
     if (opened.error) {
         std::cerr << opened.error->ToString() << "\n";
         return nullptr;
     }
     PrintWarnings(opened.warnings);
+    if (warnings)
+        *warnings = opened.warnings.size();
     return std::move(opened.document);
 }
 
@@ -78,7 +84,8 @@ int New(int fractions, int layers, const std::string& output) {
 }
 
 int Validate(const std::string& file) {
-    std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
+    size_t warnings = 0;
+    std::unique_ptr<CSetupDocument> doc = OpenOrReport(file, &warnings);
     if (!doc)
         return kExitError;
     const int ok = doc->ValidateAll();
@@ -86,14 +93,22 @@ int Validate(const std::string& file) {
         std::cout << NodePath(e.node) << ": " << e.message << "\n";
     if (!FlushStdout())
         return kExitError;
-    return ok && doc->Errors().empty() ? kExitOk : kExitInvalid;
+    return ok && doc->Errors().empty() && warnings == 0 ? kExitOk : kExitInvalid;
 }
 
-int Format(const std::string& file, const std::string& output) {
+int Format(const std::string& file, const std::string& output, bool force) {
     std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
     if (!doc)
         return kExitError;
-    return WriteOut(*doc, output.empty() ? file : output) ? kExitOk : kExitError;
+    const std::string target = output.empty() ? file : output;
+    const size_t dropped = doc->DroppedOnSave().size();
+    if (dropped > 0 && !force && target != "-") {
+        std::cerr << "mudsetup: " << target << " not written: saving would drop "
+                  << (dropped == 1 ? "the entry" : std::to_string(dropped) + " entries")
+                  << " reported above; --force writes it anyway\n";
+        return kExitInvalid;
+    }
+    return WriteOut(*doc, target) ? kExitOk : kExitError;
 }
 
 int Show(const std::string& file) {
@@ -128,6 +143,7 @@ void AddSetupCommands(CLI::App& app, int& status) {
         int layers = 1;
         std::string file;
         std::string output;
+        bool force = false;
     };
     auto opts = std::make_shared<Options>();
 
@@ -146,7 +162,8 @@ void AddSetupCommands(CLI::App& app, int& status) {
     CLI::App* cmdFormat = AddCommand(app, "format", kFormatHelp);
     cmdFormat->add_option("FILE", opts->file)->required()->check(kNotEmpty);
     cmdFormat->add_option("-o", opts->output)->check(kNotEmpty);
-    cmdFormat->callback([opts, &status] { status = Format(opts->file, opts->output); });
+    cmdFormat->add_flag("--force", opts->force);
+    cmdFormat->callback([opts, &status] { status = Format(opts->file, opts->output, opts->force); });
 
     CLI::App* cmdShow = AddCommand(app, "show", kShowHelp);
     cmdShow->add_option("FILE", opts->file)->required()->check(kNotEmpty);

@@ -1,6 +1,7 @@
 // mudsetup: create, validate, reformat and inspect setups and their data without a display.
 #include "Commands.h"
 
+#include <csignal>
 #include <iostream>
 
 namespace {
@@ -13,8 +14,9 @@ const char* const kUsage =
     "                                               (standard output without -o)\n"
     "  validate FILE                                one line per message: \"PATH: message\";\n"
     "                                               exit 0 valid, 1 invalid\n"
-    "  format FILE [-o FILE]                        load and save again in the canonical\n"
-    "                                               form (in place without -o; -o - prints it)\n"
+    "  format FILE [-o FILE] [--force]              load and save again in the canonical\n"
+    "                                               form (in place without -o; -o - prints it;\n"
+    "                                               --force even when content is dropped)\n"
     "  show FILE                                    the navigation tree, one node a line\n"
     "  datafile info FILE | new KIND ...            inspect or make a data file (.qrd0, .qrd1,\n"
     "                                               .qrd2, .qrdu, .kx0, .kx2, .xyz)\n"
@@ -27,6 +29,9 @@ const char* const kUsage =
 }  // namespace
 
 int main(int argc, char** argv) {
+    // Past a file-size limit a write then fails, and the save cleans up and says so, rather
+    // than the process dying silently.
+    std::signal(SIGXFSZ, SIG_IGN);
     int status = cli::kExitOk;
     CLI::App app(kUsage, "mudsetup");
     app.require_subcommand(1);

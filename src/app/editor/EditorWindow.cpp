@@ -43,6 +43,7 @@
 #include <QTreeWidget>
 #include <QVBoxLayout>
 
+#include <algorithm>
 #include <set>
 
 namespace {
@@ -263,6 +264,7 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
         delete w.data();
     m_retiring.clear();
     m_messages->clear();
+    m_readWarnings.clear();
     m_doc = std::move(doc);
     m_doc->SetTreeItemSelector([this](CZoSEKivBase* node) { SelectTreeItem(node); });
     m_path = path;
@@ -318,21 +320,48 @@ bool CEditorWindow::OpenFile(const QString& path) {
 }
 
 void CEditorWindow::ShowReadWarnings(const std::vector<paramfile::Diagnostic>& warnings) {
+    m_readWarnings = warnings;
     if (warnings.empty())
         return;
-    for (const paramfile::Diagnostic& w : warnings) {
-        auto* item = new QTreeWidgetItem(m_messages);
-        item->setText(0, QStringLiteral("%1:%2:%3").arg(Q(w.file)).arg(w.pos.line).arg(w.pos.column));
-        item->setText(1, tr("warning: %1").arg(Q(w.message)));
-        item->setIcon(0, style()->standardIcon(QStyle::SP_MessageBoxWarning));
-    }
+    AddReadWarningItems();
     m_messagesDock->show();
     statusBar()->showMessage(tr("Opened with %n warning(s); see the messages", nullptr,
                                 static_cast<int>(warnings.size())));
 }
 
+void CEditorWindow::AddReadWarningItems() {
+    const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxWarning);
+    for (const paramfile::Diagnostic& w : m_readWarnings) {
+        auto* item = new QTreeWidgetItem(m_messages);
+        item->setText(0, QStringLiteral("%1:%2:%3").arg(Q(w.file)).arg(w.pos.line).arg(w.pos.column));
+        item->setText(1, tr("warning: %1").arg(Q(w.message)));
+        item->setToolTip(1, Q(w.message));
+        item->setIcon(0, icon);
+    }
+}
+
 bool CEditorWindow::SaveFile(const QString& path) {
     Validate();
+    if (const auto& dropped = m_doc->DroppedOnSave(); !dropped.empty()) {
+        QString list;
+        const size_t shown = std::min<size_t>(dropped.size(), 5);
+        for (size_t i = 0; i < shown; ++i)
+            list += QStringLiteral("\n%1:%2: %3")
+                        .arg(dropped[i].pos.line)
+                        .arg(dropped[i].pos.column)
+                        .arg(Q(dropped[i].message));
+        if (dropped.size() > shown)
+            list += tr("\n... and %n more (see the messages)", nullptr,
+                       static_cast<int>(dropped.size() - shown));
+        const QMessageBox::StandardButton answer =
+            Ask({QMessageBox::Warning, tr("Save Setup"),
+                 tr("The file held content that no section of the setup reads. Saving drops "
+                    "it:\n%1\n\nSave anyway?")
+                     .arg(list),
+                 QMessageBox::Save | QMessageBox::Cancel});
+        if (answer != QMessageBox::Save)
+            return false;
+    }
     std::string error;
     if (!m_doc->SaveAs(path.toStdString(), &error)) {
         Ask({QMessageBox::Critical, tr("Save Setup"),
@@ -344,6 +373,9 @@ bool CEditorWindow::SaveFile(const QString& path) {
     m_path = QFileInfo(path).absoluteFilePath();
     SetModified(false);
     AddRecentFile(m_path);
+    // The file now holds what the setup holds: what reading said of the old one is past
+    // (the list shows it until the next validation).
+    m_readWarnings.clear();
     const int problems = static_cast<int>(m_doc->Errors().size());
     statusBar()->showMessage(problems ? tr("Saved %1 with %n validation message(s)", nullptr, problems).arg(path)
                                       : tr("Saved %1").arg(path),
@@ -368,6 +400,7 @@ bool CEditorWindow::Validate() {
     CommitPendingEdit();
     const int ok = m_doc->ValidateAll();
     m_messages->clear();
+    AddReadWarningItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);

@@ -38,7 +38,8 @@ public:
     // open document stays as it was. Warnings from reading go to the message list.
     bool OpenFile(const QString& path);
     // Validates, then saves atomically; on failure the reason is shown, the file on disk
-    // stays as it was and the document stays modified.
+    // stays as it was and the document stays modified. When saving would drop content that
+    // reading reported, the user is asked first.
     bool SaveFile(const QString& path);
     // Asks what to do with unsaved changes; true when the caller may go on.
     bool MaybeSave();
@@ -95,6 +96,7 @@ private:
     void SetModified(bool modified);
     void UpdateTitle();
     QMessageBox::StandardButton Ask(const Prompt& prompt);
+    void AddReadWarningItems();
 
     std::vector<ShownEntry> CollectModuleEntries() const;
     void RebuildTree();
@@ -144,6 +146,8 @@ private:
     QTreeWidget* m_messages = nullptr;
     QTextBrowser* m_help = nullptr;
     class QDockWidget* m_messagesDock = nullptr;
+    // Warnings of reading the open file, shown with every validation until it is saved.
+    std::vector<paramfile::Diagnostic> m_readWarnings;
     class QDockWidget* m_helpDock = nullptr;
     QMenu* m_recentMenu = nullptr;
 };

@@ -8,6 +8,7 @@
 #include <QStyleFactory>
 #include <QTimer>
 
+#include <csignal>
 #include <cstdio>
 #include <cstring>
 #include <string>
@@ -94,6 +95,8 @@ int TakeScreenshot(CEditorWindow& window, const Options& o) {
 }  // namespace
 
 int main(int argc, char** argv) {
+    // Past a file-size limit a save then fails with a message instead of killing the editor.
+    std::signal(SIGXFSZ, SIG_IGN);
     for (int i = 1; i < argc; ++i)
         if (!std::strcmp(argv[i], "--help") || !std::strcmp(argv[i], "-h")) {
             std::fputs(kUsage, stdout);

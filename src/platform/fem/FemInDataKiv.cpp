@@ -30,6 +30,29 @@ std::vector<int> CFemInDataKiv::AllowedFormats() const {
     return formats;
 }
 
+bool CFemInDataKiv::IsFormatAllowed(int format) const {
+    return format == 0 || (format > 0 && (format & m_formatCode) == format);
+}
+
+namespace {
+CString AllowedFormatNames(const CFemInDataKiv& value) {
+    CString names;
+    for (int f : value.AllowedFormats()) {
+        if (!names.empty())
+            names += ", ";
+        names += CFemInDataKiv::FormatName(f);
+    }
+    return names;
+}
+}  // namespace
+
+void CFemInDataKiv::WarnUnlessFormatAllowed(void* h) const {
+    if (!IsFormatAllowed(m_format))
+        kivWarn(h, "format",
+                FormatString("format = %d is not a format of this value (%s); kept as read",
+                             m_format, AllowedFormatNames(*this).c_str()));
+}
+
 CString CFemInDataKiv::FormatName(int format) {
     if (format == 0)
         return "Constant";
@@ -68,6 +91,7 @@ void CFemInDataKiv::WriteData(void* h) {
 
 void CFemInDataKiv::ReadData(void* h) {
     kivGetParam(h, "format", &m_format, 1, 1);
+    WarnUnlessFormatAllowed(h);
     kivGetParam(h, "constant_value", &m_constant, 1, 1);
     CString name = m_file.FileName();
     kivGetParamFilename(h, "file_name", &name, 1, 1);
@@ -92,6 +116,11 @@ int CFemInDataKiv::ValidateData() {
         return 1;
     const CString title = GetTitle();
     const CString what = title.empty() ? CString("the value") : FormatString("'%s'", title.c_str());
+    if (!IsFormatAllowed(m_format)) {
+        AddError(FormatString("Format %d is not one of the formats of %s (%s)", m_format,
+                              what.c_str(), AllowedFormatNames(*this).c_str()));
+        return 0;
+    }
     if (m_file.FileName().empty()) {
         AddError("No data file is given for " + what);
         return 0;

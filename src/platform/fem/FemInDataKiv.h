@@ -34,6 +34,9 @@ public:
     double Constant() const { return m_constant; }
     void Constant(double value) { m_constant = value; }
     double DefaultConstant() const { return m_default; }
+    // Where the owner saves the constant as a float, forms refuse numbers beyond its range.
+    bool ConstantIsFloat() const { return m_constantIsFloat; }
+    void ConstantIsFloat(bool isFloat) { m_constantIsFloat = isFloat; }
     int Format() const { return m_format; }
     void Format(int format) { m_format = format; }
     int FormatCode() const { return m_formatCode; }
@@ -51,6 +54,10 @@ public:
 
     // The formats this value may take, constant first.
     std::vector<int> AllowedFormats() const;
+    bool IsFormatAllowed(int format) const;
+    // On reading: a warning at the value's "format" keyword of section h when the format is
+    // not one the value may take (it is kept as read, and validation reports it).
+    void WarnUnlessFormatAllowed(void* h) const;
     static CString FormatName(int format);
     // One line for grids: "Constant" or the kind of variation.
     CString FormatText() const;
@@ -71,6 +78,7 @@ private:
     long m_itemType;
     std::vector<long> m_furtherItemTypes;
     bool m_disabled = false;
+    bool m_constantIsFloat = false;
     int m_type = 0;
     CFemInDataFile m_file;
 };

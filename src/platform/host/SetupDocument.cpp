@@ -10,6 +10,7 @@
 #include "hydro/HDSourcesKiv.h"
 #include "hydro/HDWindForcingKiv.h"
 
+#include <algorithm>
 #include <filesystem>
 #include <set>
 
@@ -73,8 +74,51 @@ CSetupDocument::OpenResult CSetupDocument::FromParsed(paramfile::ParseResult par
         c->Load(top);
     result.warnings = parsed.document->Warnings();
     doc->m_source = std::move(parsed.document);
+    doc->CheckWhatWasRead(result.warnings);
     result.document = std::move(doc);
     return result;
+}
+
+CZoSEKivBase* CSetupDocument::OwnerOf(std::string_view sectionName) {
+    POSITION pos = 0;
+    for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))
+        if (!c->GetSectionNamePattern().empty() && c->GetSectionName() == sectionName)
+            return c;
+    return nullptr;
+}
+
+void CSetupDocument::CheckWhatWasRead(std::vector<paramfile::Diagnostic>& warnings) {
+    const paramfile::Section& root = m_source->Root();
+    // Sections of other modules are kept as read; those of the host and the module are
+    // written again from what was read, so whatever no node read would be lost.
+    for (int i = 0; i < root.EntryCount(); ++i) {
+        const paramfile::Section& s = root.SectionAt(i);
+        if (!OwnerOf(s.Name()))
+            continue;
+        if (s.WasFound()) {
+            std::vector<paramfile::Diagnostic> unread =
+                paramfile::UnreadEntries(s, std::string(s.Name()));
+            m_dropped.insert(m_dropped.end(), unread.begin(), unread.end());
+            continue;
+        }
+        const paramfile::Section* first = root.FindSection(s.Name());
+        warnings.push_back(paramfile::Diagnostic{
+            m_fileName, s.Pos(),
+            FormatString("section '%s' repeated at the top level (first at line %d): only the "
+                         "first is read, this one is kept as it is",
+                         std::string(s.Name()).c_str(), first ? first->Pos().line : 0)});
+    }
+    if (!root.FindSection(m_module->GetSectionName()))
+        warnings.push_back(paramfile::Diagnostic{
+            m_fileName, m_source->End(),
+            FormatString("no section '%s' in the file: the module takes its defaults",
+                         m_module->GetSectionName().c_str())});
+    warnings.insert(warnings.end(), m_dropped.begin(), m_dropped.end());
+    std::stable_sort(warnings.begin(), warnings.end(),
+                     [](const paramfile::Diagnostic& a, const paramfile::Diagnostic& b) {
+                         return a.pos.line != b.pos.line ? a.pos.line < b.pos.line
+                                                         : a.pos.column < b.pos.column;
+                     });
 }
 
 std::string CSetupDocument::ToText() {
@@ -83,21 +127,15 @@ std::string CSetupDocument::ToText() {
     void* h = &builder;
 
     std::set<CString> written;
-    auto ownerOf = [&](std::string_view name) -> CZoSEKivBase* {
-        POSITION pos = 0;
-        for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))
-            if (c->GetSectionName() == name)
-                return c;
-        return nullptr;
-    };
     // Sections keep the places they had in the file; new ones follow in the host's order.
     if (m_source) {
+        builder.TakeCommentsFrom(*m_source);
         const paramfile::Section& root = m_source->Root();
         for (int i = 0; i < root.EntryCount(); ++i) {
             if (!root.EntryIsSection(i))
                 continue;
             const paramfile::Section& s = root.SectionAt(i);
-            CZoSEKivBase* owner = ownerOf(s.Name());
+            CZoSEKivBase* owner = OwnerOf(s.Name());
             if (owner && written.insert(owner->GetSectionName()).second)
                 owner->Save(h);
             else
@@ -116,6 +154,7 @@ bool CSetupDocument::SaveAs(const std::string& path, std::string* error) {
     if (!paramfile::WriteFileAtomic(path, text, error))
         return false;
     m_fileName = path;
+    m_dropped.clear();
     return true;
 }
 

@@ -30,7 +30,9 @@ public:
     struct OpenResult {
         std::unique_ptr<CSetupDocument> document;      // null when error is set
         std::optional<paramfile::Diagnostic> error;    // unreadable file or syntax error
-        std::vector<paramfile::Diagnostic> warnings;   // values that could not be used
+        // Values that could not be used, content no node reads, counts that disagree...,
+        // in the order of the file.
+        std::vector<paramfile::Diagnostic> warnings;
     };
     static OpenResult Open(const std::string& path);
     static OpenResult FromText(std::string text, const std::string& fileName);
@@ -39,6 +41,10 @@ public:
     std::string ToText();
     // Atomic: on failure the file on disk and this document stay as they were.
     bool SaveAs(const std::string& path, std::string* error);
+
+    // What the file held that no node reads, so that saving drops it (one warning each, also
+    // among the warnings of Open). Empty after the first successful save.
+    const std::vector<paramfile::Diagnostic>& DroppedOnSave() const { return m_dropped; }
 
     // Clears the error list and validates the host's nodes and, when it is in use, the module.
     int ValidateAll();
@@ -70,10 +76,15 @@ private:
         return node;
     }
     static OpenResult FromParsed(paramfile::ParseResult parsed, const std::string& fileName);
+    CZoSEKivBase* OwnerOf(std::string_view sectionName);
+    // Reports what loading passed over: content no node read, a module section that is
+    // missing or repeated.
+    void CheckWhatWasRead(std::vector<paramfile::Diagnostic>& warnings);
 
     std::string m_fileName;
     // What was read, for the top-level sections that are kept as they were.
     std::unique_ptr<paramfile::Document> m_source;
+    std::vector<paramfile::Diagnostic> m_dropped;
     CMudTransportModuleKiv* m_module = nullptr;
     CModuleSelection* m_moduleSelection = nullptr;
     CDomainKiv* m_domain = nullptr;

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <limits>
 #include <new>
+#include <unordered_set>
 
 #include <sys/mman.h>
 
@@ -371,6 +372,12 @@ Position Keyword::Pos() const {
 const Section& Keyword::Owner() const {
     return doc_ ? doc_->impl().sections[owner_] : kNoSection;
 }
+bool Keyword::WasFound() const {
+    if (!doc_)
+        return false;
+    const Document::Impl& d = doc_->impl();
+    return d.WasFound(static_cast<std::uint32_t>(this - d.keywords.data()), false);
+}
 
 std::string_view Section::Name() const {
     return doc_ ? doc_->impl().names[name_] : "";
@@ -413,7 +420,17 @@ const Section* Section::FindSection(std::string_view name, int n) const {
     const Document::Impl& d = doc_->impl();
     const std::int64_t at = d.FindEntry(static_cast<std::uint32_t>(this - d.sections.data()),
                                         firstEntry_, entryCount_, name, n, true);
-    return at < 0 ? nullptr : &d.sections[static_cast<size_t>(at)];
+    if (at < 0)
+        return nullptr;
+    d.MarkFound(static_cast<std::uint32_t>(at), true);
+    return &d.sections[static_cast<size_t>(at)];
+}
+
+bool Section::WasFound() const {
+    if (!doc_)
+        return false;
+    const Document::Impl& d = doc_->impl();
+    return d.WasFound(static_cast<std::uint32_t>(this - d.sections.data()), true);
 }
 
 const Keyword* Section::FindKeyword(std::string_view name, int n) const {
@@ -422,7 +439,10 @@ const Keyword* Section::FindKeyword(std::string_view name, int n) const {
     const Document::Impl& d = doc_->impl();
     const std::int64_t at = d.FindEntry(static_cast<std::uint32_t>(this - d.sections.data()),
                                         firstEntry_, entryCount_, name, n, false);
-    return at < 0 ? nullptr : &d.keywords[static_cast<size_t>(at)];
+    if (at < 0)
+        return nullptr;
+    d.MarkFound(static_cast<std::uint32_t>(at), false);
+    return &d.keywords[static_cast<size_t>(at)];
 }
 
 const Document::Impl::LookupIndex& Document::Impl::IndexOf(std::uint32_t sectionIndex,
@@ -504,6 +524,68 @@ void Document::AddWarning(Position pos, std::string message) const {
     impl_->warnings.push_back(Diagnostic{impl_->fileName, pos, std::move(message)});
 }
 
+Position Document::End() const {
+    return impl_->end;
+}
+
+std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string& path) {
+    std::vector<Diagnostic> out;
+    const Document* doc = Access::DocOf(section);
+    if (!doc)
+        return out;
+    const Document::Impl& d = doc->impl();
+    struct Todo {
+        const Section* section;
+        std::string path;
+    };
+    std::vector<Todo> todo{{&section, path}};
+    std::unordered_set<std::uint32_t> foundNames[2]; // [1] sections
+    while (!todo.empty()) {
+        const Todo t = std::move(todo.back());
+        todo.pop_back();
+        const std::uint32_t* e = d.entries.data() + Access::FirstEntry(*t.section);
+        const std::uint32_t n = Access::EntryCount(*t.section);
+        bool namesKnown = false;
+        for (std::uint32_t i = 0; i < n; ++i) {
+            const bool isSection = (e[i] & kSectionBit) != 0;
+            const std::uint32_t at = e[i] & ~kSectionBit;
+            const std::uint32_t name =
+                isSection ? Access::NameId(d.sections[at]) : Access::NameId(d.keywords[at]);
+            if (d.WasFound(at, isSection)) {
+                if (isSection)
+                    todo.push_back({&d.sections[at], Cat(t.path, "/", d.names[name])});
+                continue;
+            }
+            if (!namesKnown) {
+                // A second occurrence of a name read once is a repetition, not an unknown.
+                foundNames[0].clear();
+                foundNames[1].clear();
+                for (std::uint32_t j = 0; j < n; ++j) {
+                    const bool s = (e[j] & kSectionBit) != 0;
+                    const std::uint32_t a = e[j] & ~kSectionBit;
+                    if (d.WasFound(a, s))
+                        foundNames[s].insert(s ? Access::NameId(d.sections[a])
+                                               : Access::NameId(d.keywords[a]));
+                }
+                namesKnown = true;
+            }
+            const char* what = isSection ? "section" : "keyword";
+            const Position pos = isSection ? d.sections[at].Pos() : d.keywords[at].Pos();
+            std::string message =
+                foundNames[isSection].count(name)
+                    ? Cat(what, " '", d.names[name], "' repeated in ", t.path,
+                          ": only the first is read, this one is dropped on saving")
+                    : Cat("unknown ", what, " '", d.names[name], "' in ", t.path,
+                          ": not read, dropped on saving");
+            out.push_back(Diagnostic{d.fileName, pos, std::move(message)});
+        }
+    }
+    std::sort(out.begin(), out.end(), [](const Diagnostic& a, const Diagnostic& b) {
+        return a.pos.line != b.pos.line ? a.pos.line < b.pos.line : a.pos.column < b.pos.column;
+    });
+    return out;
+}
+
 // --- Builder -----------------------------------------------------------------------------
 
 struct Builder::State {
@@ -515,6 +597,11 @@ struct Builder::State {
     std::int64_t keyword = -1; // receives the parameters added next
     int skipped = 0;           // sections opened past the depth limit, dropped whole
     std::string name;          // scratch for names that need repair
+    // Where comments come from: the source's counterparts of the open sections (null where
+    // the source has none); not followed while a section is copied.
+    const Document* commentSource = nullptr;
+    std::vector<const Section*> sourceOpen;
+    int copying = 0;
 };
 
 Builder::Builder(Document& doc) : doc_(doc), state_(std::make_unique<State>()) {
@@ -573,7 +660,44 @@ void AppendEntry(Document::Impl& d, Builder::State& st, std::uint32_t entry) {
     ++count;
 }
 
+void CopyComments(const Document::Impl& from, std::uint32_t fromKey, Document::Impl& to,
+                  std::uint32_t toKey) {
+    if (from.comments.empty() && from.closingComments.empty())
+        return;
+    if (auto it = from.comments.find(fromKey); it != from.comments.end())
+        to.comments[toKey] = it->second;
+    if (fromKey & kSectionBit)
+        if (auto it = from.closingComments.find(fromKey & ~kSectionBit);
+            it != from.closingComments.end())
+            to.closingComments[toKey & ~kSectionBit] = it->second;
+}
+
+// The source's entry of that name in the source's counterpart of the open section, or -1.
+std::int64_t SourceEntry(const Builder::State& st, std::string_view name, bool wantSection) {
+    const Section* parent = st.sourceOpen.empty() ? nullptr : st.sourceOpen.back();
+    if (!parent)
+        return -1;
+    const Document::Impl& src = st.commentSource->impl();
+    return src.FindEntry(static_cast<std::uint32_t>(parent - src.sections.data()),
+                         Access::FirstEntry(*parent), Access::EntryCount(*parent), name, 1,
+                         wantSection);
+}
+
+bool FollowsSource(const Builder::State& st) {
+    return st.commentSource && st.copying == 0;
+}
+
 } // namespace
+
+void Builder::TakeCommentsFrom(const Document& source) {
+    State& st = *state_;
+    st.commentSource = &source;
+    st.sourceOpen.assign(st.open.size(), nullptr);
+    st.sourceOpen.front() = &source.Root();
+    if (auto it = source.impl().closingComments.find(0);
+        it != source.impl().closingComments.end())
+        doc_.impl().closingComments[0] = it->second;
+}
 
 void Builder::BeginSection(std::string_view name) {
     State& st = *state_;
@@ -589,15 +713,26 @@ void Builder::BeginSection(std::string_view name) {
     d.sections.push_back(Access::MakeSection(&doc_, id, {}));
     Access::FirstEntry(d.sections.back()) = static_cast<std::uint32_t>(d.entries.size());
     st.open.push_back({index, 0});
+    if (FollowsSource(st)) {
+        const std::int64_t at = SourceEntry(st, d.names[id], true);
+        const Document::Impl& src = st.commentSource->impl();
+        st.sourceOpen.push_back(at < 0 ? nullptr : &src.sections[static_cast<size_t>(at)]);
+        if (at >= 0)
+            CopyComments(src, kSectionBit | static_cast<std::uint32_t>(at), d,
+                         kSectionBit | index);
+    }
 }
 
 void Builder::EndSection() {
     State& st = *state_;
     st.keyword = -1;
-    if (st.skipped > 0)
+    if (st.skipped > 0) {
         --st.skipped;
-    else if (st.open.size() > 1)
+    } else if (st.open.size() > 1) {
         st.open.pop_back();
+        if (FollowsSource(st) && st.sourceOpen.size() > 1)
+            st.sourceOpen.pop_back();
+    }
 }
 
 void Builder::AddKeyword(std::string_view name) {
@@ -612,6 +747,11 @@ void Builder::AddKeyword(std::string_view name) {
     d.keywords.push_back(Access::MakeKeyword(&doc_, st.open.back().section, id,
                                              static_cast<std::uint32_t>(d.params.size()), {}));
     st.keyword = index;
+    if (FollowsSource(st) && !st.commentSource->impl().comments.empty()) {
+        const std::int64_t at = SourceEntry(st, d.names[id], false);
+        if (at >= 0)
+            CopyComments(st.commentSource->impl(), static_cast<std::uint32_t>(at), d, index);
+    }
 }
 
 namespace {
@@ -670,8 +810,18 @@ void Builder::CopySection(const Section& section) {
         const Section* section;
         int next;
     };
+    State& st = *state_;
+    Document::Impl& d = doc_.impl();
+    const Document::Impl& src = Access::Of(section);
+    auto begin = [&](const Section& s) {
+        BeginSection(s.Name());
+        if (st.skipped == 0)
+            CopyComments(src, kSectionBit | static_cast<std::uint32_t>(&s - src.sections.data()),
+                         d, kSectionBit | static_cast<std::uint32_t>(d.sections.size() - 1));
+    };
+    ++st.copying;
     std::vector<Frame> stack{{&section, 0}};
-    BeginSection(section.Name());
+    begin(section);
     while (!stack.empty()) {
         Frame& f = stack.back();
         if (f.next == f.section->EntryCount()) {
@@ -682,12 +832,15 @@ void Builder::CopySection(const Section& section) {
         const int i = f.next++;
         if (f.section->EntryIsSection(i)) {
             const Section& child = f.section->SectionAt(i);
-            BeginSection(child.Name());
+            begin(child);
             stack.push_back({&child, 0});
             continue;
         }
         const Keyword& k = f.section->KeywordAt(i);
         AddKeyword(k.Name());
+        if (st.keyword >= 0)
+            CopyComments(src, static_cast<std::uint32_t>(&k - src.keywords.data()), d,
+                         static_cast<std::uint32_t>(st.keyword));
         for (int j = 0; j < k.ParamCount(); ++j) {
             const Param& p = k.ParamAt(j);
             if (p.Type() == ParamType::String || p.Type() == ParamType::FileName) {
@@ -701,6 +854,7 @@ void Builder::CopySection(const Section& section) {
             }
         }
     }
+    --st.copying;
 }
 
 int Builder::Depth() const {

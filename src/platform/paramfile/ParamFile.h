@@ -76,6 +76,8 @@ public:
     const Param& ParamAt(int index) const;  // 0-based, index < ParamCount()
     Position Pos() const;
     const Section& Owner() const;
+    // True once a look-up by name (FindKeyword) has found this keyword.
+    bool WasFound() const;
 
 private:
     friend class Document;
@@ -103,9 +105,11 @@ public:
     const Keyword& KeywordAt(int index) const;   // EntryIsSection(index) false
     const Section& SectionAt(int index) const;   // EntryIsSection(index) true
 
-    // The n-th occurrence (from 1) of a subsection or keyword of that name, or null.
+    // The n-th occurrence (from 1) of a subsection or keyword of that name, or null. What
+    // they find counts as read (WasFound).
     const Section* FindSection(std::string_view name, int n = 1) const;
     const Keyword* FindKeyword(std::string_view name, int n = 1) const;
+    bool WasFound() const;
 
 private:
     friend class Document;
@@ -135,6 +139,8 @@ public:
 
     const std::vector<Diagnostic>& Warnings() const;
     void AddWarning(Position pos, std::string message) const;
+    // Where the text read ended (its last line); line 0 for a document built in memory.
+    Position End() const;
 
     struct Impl;
     Impl& impl() const { return *impl_; }
@@ -148,17 +154,29 @@ struct ParseResult {
     std::optional<Diagnostic> error;
 };
 
+// Every entry below section that no look-up found, one message each at its place ("unknown
+// keyword 'x' in PATH"); the subsections found are searched in turn, the others reported
+// whole. path names section in the messages. Linear in the entries.
+std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string& path);
+
 // Checks the whole text first: on a syntax error nothing is returned but the error.
 ParseResult ParseText(std::string text, std::string fileName);
-// As ParseText; a file that cannot be read gives an error at line 0, column 0.
+// As ParseText; a file that cannot be read, or is not a regular file of at most
+// kMaxFileBytes, gives an error at line 0, column 0 (nothing is read from it).
+inline constexpr long long kMaxFileBytes = 0x7FFFFFFE;
 ParseResult ParseFile(const std::string& path);
 
-// The canonical text: four spaces a level, "keyword = v1, v2", reals in shortest form.
+// The canonical text: four spaces a level, "keyword = v1, v2", reals in shortest form;
+// comments on lines of their own before their entry, or after it on its line.
 std::string WriteText(const Document& doc);
 void WriteText(const Document& doc, std::string& out);
 
 // Writes beside the target and renames over it only when everything was written and
-// flushed; on failure the target is untouched and error says why.
+// flushed; on failure the target is untouched and error says why. A symbolic link is
+// followed (the file it names is replaced); anything but a regular file or a new name is
+// refused. The text goes to an unnamed file first where the file system allows it, so that
+// a process killed while writing leaves nothing behind; temporaries of saves that died
+// are removed.
 bool WriteFileAtomic(const std::string& path, std::string_view text, std::string* error);
 
 // Builds a document in order: sections opened and closed, keywords with their parameters.
@@ -178,8 +196,12 @@ public:
     void AddBool(bool v);
     void AddString(std::string_view v);
     void AddFileName(std::string_view v);
-    // Deep copy of a section of another (or this) document into the current section.
+    // Deep copy of a section of another (or this) document into the current section, with
+    // its comments.
     void CopySection(const Section& section);
+    // Sections and keywords built from now on take the comments of their namesakes at the
+    // same place in source (which must outlive the builder).
+    void TakeCommentsFrom(const Document& source);
     int Depth() const;  // open sections below the root
 
     struct State;

@@ -101,7 +101,33 @@ struct Document::Impl {
     NameTable names;
     Arena text;
     std::size_t sourceBytes = 0; // size of the text read, a hint for the writer
+    Position end;                // where the text read ended
     mutable std::vector<Diagnostic> warnings;
+
+    // Which entries a look-up by name has found: what no one asked for was not read.
+    mutable std::vector<std::uint8_t> foundKeywords;
+    mutable std::vector<std::uint8_t> foundSections;
+    void MarkFound(std::uint32_t at, bool isSection) const {
+        auto& found = isSection ? foundSections : foundKeywords;
+        const std::size_t size = isSection ? sections.size() : keywords.size();
+        if (found.size() < size)
+            found.resize(size, 0);
+        found[at] = 1;
+    }
+    bool WasFound(std::uint32_t at, bool isSection) const {
+        const auto& found = isSection ? foundSections : foundKeywords;
+        return at < found.size() && found[at] != 0;
+    }
+
+    // Comments, kept with the entry that follows them (and the one on whose line they stand);
+    // keyed by entry code (keyword index, or section index with kSectionBit). Those after a
+    // section's last entry close it (the root's end the file). Empty in most files.
+    struct Comments {
+        std::string before; // whole lines, '\n' between them, without their indentation
+        std::string after;  // on the entry's own line
+    };
+    std::unordered_map<std::uint32_t, Comments> comments;
+    std::unordered_map<std::uint32_t, std::string> closingComments; // by section index
 
     // Look-ups by name in a section with many entries (a list of thousands of items) go
     // through an index made on first use, so that reading every item stays linear.

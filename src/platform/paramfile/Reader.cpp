@@ -173,6 +173,17 @@ private:
         d_.params.push_back(p);
         ++Access::ParamCount(d_.keywords.back());
     }
+    void ReadComment();
+    // The entry just made takes the comment lines before it.
+    void Attach(std::uint32_t key) {
+        if (!pendingComment_.empty()) {
+            d_.comments[key].before = std::move(pendingComment_);
+            pendingComment_.clear();
+        }
+        lastEntry_ = key;
+        lastEntryLine_ = line_;
+    }
+    void CheckUtf8(const char* begin, const char* end, const char* what);
 
     struct Open {
         std::uint32_t section;
@@ -190,7 +201,78 @@ private:
     // document when it closes, so every section's entries end up contiguous.
     std::vector<std::uint32_t> pending_;
     std::string scratch_;
+    std::string pendingComment_;
+    std::int64_t lastEntry_ = -1; // entry key of the last keyword or section opened
+    int lastEntryLine_ = 0;
 };
+
+void Reader::ReadComment() {
+    const void* nl = std::memchr(p_, '\n', static_cast<std::size_t>(end_ - p_));
+    const char* e = nl ? static_cast<const char*>(nl) : end_;
+    const char* t = e;
+    while (t > p_ && (t[-1] == ' ' || t[-1] == '\t' || t[-1] == '\r'))
+        --t;
+    const std::string_view text(p_, std::size_t(t - p_));
+    if (lastEntry_ >= 0 && lastEntryLine_ == line_) {
+        d_.comments[static_cast<std::uint32_t>(lastEntry_)].after.assign(text);
+    } else {
+        if (!pendingComment_.empty())
+            pendingComment_ += '\n';
+        pendingComment_.append(text);
+    }
+    p_ = e;
+}
+
+// Length of the valid UTF-8 sequence at p (before end), 0 when it is not one.
+std::size_t Utf8Length(const unsigned char* p, const unsigned char* end) {
+    const unsigned c = p[0];
+    std::size_t n;
+    unsigned min;
+    if (c < 0x80)
+        return 1;
+    if (c >= 0xC2 && c <= 0xDF) {
+        n = 2;
+        min = 0x80;
+    } else if (c >= 0xE0 && c <= 0xEF) {
+        n = 3;
+        min = 0x800;
+    } else if (c >= 0xF0 && c <= 0xF4) {
+        n = 4;
+        min = 0x10000;
+    } else {
+        return 0;
+    }
+    if (static_cast<std::size_t>(end - p) < n)
+        return 0;
+    unsigned cp = c & (0x7Fu >> n);
+    for (std::size_t i = 1; i < n; ++i) {
+        if ((p[i] & 0xC0) != 0x80)
+            return 0;
+        cp = cp << 6 | (p[i] & 0x3Fu);
+    }
+    if (cp < min || cp > 0x10FFFF || (cp >= 0xD800 && cp <= 0xDFFF))
+        return 0;
+    return n;
+}
+
+void Reader::CheckUtf8(const char* begin, const char* end, const char* what) {
+    const auto* p = reinterpret_cast<const unsigned char*>(begin);
+    const auto* e = reinterpret_cast<const unsigned char*>(end);
+    while (p < e && *p < 0x80)
+        ++p;
+    while (p < e) {
+        const std::size_t n = Utf8Length(p, e);
+        if (n == 0) {
+            char byte[8];
+            std::snprintf(byte, sizeof byte, "0x%02X", *p);
+            doc_.AddWarning(PosOf(reinterpret_cast<const char*>(p)),
+                            Cat(what, " of '", d_.names[Access::NameId(d_.keywords.back())],
+                                "' is not valid UTF-8 (byte ", byte, "); kept byte for byte"));
+            return;
+        }
+        p += n;
+    }
+}
 
 std::string Reader::Token(const char* at) const {
     const char* e = at;
@@ -238,8 +320,7 @@ bool Reader::Run() {
             continue;
         }
         if (c == '#') {
-            const void* nl = std::memchr(p_, '\n', static_cast<std::size_t>(end_ - p_));
-            p_ = nl ? static_cast<const char*>(nl) : end_;
+            ReadComment();
             continue;
         }
         if (c == '\0' && p_ == end_)
@@ -248,6 +329,7 @@ bool Reader::Run() {
             if (open_.size() == 1)
                 return Fail(p_, "unexpected '}'");
             CloseSection();
+            lastEntry_ = -1;
             ++p_;
             continue;
         }
@@ -282,6 +364,7 @@ bool Reader::Run() {
         return FailEof(Cat("missing '}' for section '", s.Name(), "' opened at line ",
                            std::to_string(s.Pos().line)));
     }
+    d_.end = PosOf(end_);
     CloseSection();
     Trim(d_.keywords);
     Trim(d_.params);
@@ -298,6 +381,7 @@ bool Reader::OpenSection(const char* name, const char* nameEnd) {
     d_.sections.push_back(Access::MakeSection(&doc_, Intern(name, nameEnd), PosOf(name)));
     pending_.push_back(kSectionBit | index);
     open_.push_back({index, static_cast<std::uint32_t>(pending_.size())});
+    Attach(kSectionBit | index);
     return true;
 }
 
@@ -305,6 +389,10 @@ void Reader::CloseSection() {
     const Open o = open_.back();
     open_.pop_back();
     Section& s = d_.sections[o.section];
+    if (!pendingComment_.empty()) {
+        d_.closingComments[o.section] = std::move(pendingComment_);
+        pendingComment_.clear();
+    }
     Access::FirstEntry(s) = static_cast<std::uint32_t>(d_.entries.size());
     Access::EntryCount(s) = static_cast<std::uint32_t>(pending_.size() - o.pendingStart);
     d_.entries.insert(d_.entries.end(), pending_.begin() + o.pendingStart, pending_.end());
@@ -312,6 +400,7 @@ void Reader::CloseSection() {
 }
 
 bool Reader::ReadKeyword(const char* name, const char* nameEnd) {
+    Attach(static_cast<std::uint32_t>(d_.keywords.size()));
     pending_.push_back(static_cast<std::uint32_t>(d_.keywords.size()));
     d_.keywords.push_back(Access::MakeKeyword(&doc_, open_.back().section, Intern(name, nameEnd),
                                               static_cast<std::uint32_t>(d_.params.size()),
@@ -357,6 +446,7 @@ bool Reader::ReadString() {
     if (*q == '"') {
         Push(Access::Text(ParamType::String, d_.text.Store({p_, std::size_t(q - p_)}),
                           std::size_t(q - p_)));
+        CheckUtf8(p_, q, "string");
         p_ = q + 1;
         return true;
     }
@@ -399,6 +489,7 @@ bool Reader::ReadString() {
             ++p_;
         scratch_.append(run, p_);
     }
+    CheckUtf8(open + 1, p_, "string");
     ++p_;
     Push(Access::Text(ParamType::String, d_.text.Store(scratch_), scratch_.size()));
     return true;
@@ -419,6 +510,7 @@ bool Reader::ReadFileName() {
         if (*p_ != '\'')
             return Fail(open, "unterminated file name");
         if (p_[1] != '\'') {
+            CheckUtf8(open + 1, p_, "file name");
             if (scratch_.empty() && run == open + 1) {
                 const std::string_view s(run, std::size_t(p_ - run));
                 Push(Access::Text(ParamType::FileName, d_.text.Store(s), s.size()));
@@ -581,22 +673,36 @@ ParseResult ParseText(std::string text, std::string fileName) {
 }
 
 ParseResult ParseFile(const std::string& path) {
-    auto fail = [&](int err) {
+    auto refuse = [&](const std::string& why) {
         ParseResult r;
-        r.error = Diagnostic{path, {0, 0}, "cannot read '" + path + "': " + std::strerror(err)};
+        r.error = Diagnostic{path, {0, 0}, "cannot read '" + path + "': " + why};
         return r;
     };
-    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    auto fail = [&](int err) { return refuse(std::strerror(err)); };
+    // Not blocking: opening a FIFO would otherwise wait for a writer.
+    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
     if (fd < 0)
         return fail(errno);
-    std::string text;
     struct stat st {};
-    if (::fstat(fd, &st) == 0 && st.st_size > 0)
-        text.reserve(static_cast<std::size_t>(st.st_size));
+    if (::fstat(fd, &st) != 0) {
+        const int err = errno;
+        ::close(fd);
+        return fail(err);
+    }
+    if (!S_ISREG(st.st_mode)) {
+        ::close(fd);
+        return S_ISDIR(st.st_mode) ? fail(EISDIR) : refuse("not a regular file");
+    }
+    if (st.st_size > kMaxFileBytes) {
+        ::close(fd);
+        return refuse("larger than " + std::to_string(kMaxFileBytes) + " bytes");
+    }
+    std::string text;
+    text.reserve(static_cast<std::size_t>(st.st_size));
     char buf[65536];
     for (;;) {
         const ssize_t n = ::read(fd, buf, sizeof buf);
-        if (n < 0 && errno == EINTR)
+        if (n < 0 && (errno == EINTR || errno == EAGAIN))
             continue;
         if (n < 0) {
             const int err = errno;
@@ -606,6 +712,10 @@ ParseResult ParseFile(const std::string& path) {
         if (n == 0)
             break;
         text.append(buf, static_cast<std::size_t>(n));
+        if (text.size() > static_cast<std::size_t>(kMaxFileBytes)) {
+            ::close(fd);
+            return refuse("larger than " + std::to_string(kMaxFileBytes) + " bytes");
+        }
     }
     ::close(fd);
     return ParseText(std::move(text), path);

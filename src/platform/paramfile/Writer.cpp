@@ -6,7 +6,9 @@
 #include <charconv>
 #include <cstring>
 
+#include <dirent.h>
 #include <fcntl.h>
+#include <signal.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -125,6 +127,21 @@ char* PutParam(char* o, const Param& p) {
     return o;
 }
 
+void PutLines(Out& w, std::string_view lines, std::size_t depth) {
+    while (!lines.empty()) {
+        const std::size_t nl = lines.find('\n');
+        const std::string_view line = lines.substr(0, nl);
+        char* o = w.Room(4 * (depth + 1) + line.size() + 1);
+        o = Indent(o, depth);
+        o = Put(o, line);
+        *o++ = '\n';
+        w.Commit(o);
+        if (nl == std::string_view::npos)
+            break;
+        lines.remove_prefix(nl + 1);
+    }
+}
+
 } // namespace
 
 void WriteText(const Document& doc, std::string& out) {
@@ -144,11 +161,25 @@ void WriteText(const Document& doc, std::string& out) {
     const std::uint32_t* entries = d.entries.data();
     const Keyword* keywords = d.keywords.data();
     const Param* params = d.params.data();
+    const bool hasComments = !d.comments.empty() || !d.closingComments.empty();
+    const Document::Impl::Comments* comments = nullptr;
+    auto commentsOf = [&](std::uint32_t key) -> const Document::Impl::Comments* {
+        if (!hasComments)
+            return nullptr;
+        const auto it = d.comments.find(key);
+        return it == d.comments.end() ? nullptr : &it->second;
+    };
 
     while (!stack.empty()) {
         Frame& f = stack.back();
         const std::size_t depth = stack.size() - 1;
         if (f.next == Access::EntryCount(*f.section)) {
+            if (hasComments) {
+                const auto it = d.closingComments.find(
+                    static_cast<std::uint32_t>(f.section - d.sections.data()));
+                if (it != d.closingComments.end())
+                    PutLines(w, it->second, depth);
+            }
             stack.pop_back();
             if (depth > 0) {
                 char* o = w.Room(4 * depth + 2);
@@ -160,13 +191,22 @@ void WriteText(const Document& doc, std::string& out) {
             continue;
         }
         const std::uint32_t e = entries[Access::FirstEntry(*f.section) + f.next++];
+        comments = commentsOf(e);
+        if (comments)
+            PutLines(w, comments->before, depth);
+        const std::string_view after = comments ? std::string_view(comments->after) : "";
         if (e & kSectionBit) {
             const Section& s = d.sections[e & ~kSectionBit];
             const std::string_view name = d.names[Access::NameId(s)];
-            char* o = w.Room(4 * depth + name.size() + 3);
+            char* o = w.Room(4 * depth + name.size() + after.size() + 4);
             o = Indent(o, depth);
             o = Put(o, name);
-            o = Put(o, " {\n");
+            o = Put(o, " {");
+            if (!after.empty()) {
+                *o++ = ' ';
+                o = Put(o, after);
+            }
+            *o++ = '\n';
             w.Commit(o);
             stack.push_back({&s, 0});
             continue;
@@ -175,7 +215,7 @@ void WriteText(const Document& doc, std::string& out) {
         const std::string_view name = d.names[Access::NameId(k)];
         const Param* ps = params + Access::FirstParam(k);
         const std::uint32_t n = static_cast<std::uint32_t>(k.ParamCount());
-        std::size_t room = 4 * depth + name.size() + 4 + n * kNumberRoom;
+        std::size_t room = 4 * depth + name.size() + 5 + after.size() + n * kNumberRoom;
         for (std::uint32_t i = 0; i < n; ++i)
             if (ps[i].Type() == ParamType::String || ps[i].Type() == ParamType::FileName)
                 room += 2 * Access::TextOf(ps[i]).size() + 4;
@@ -190,6 +230,10 @@ void WriteText(const Document& doc, std::string& out) {
             *o++ = ' ';
             o = PutParam(o, ps[i]);
         }
+        if (!after.empty()) {
+            *o++ = ' ';
+            o = Put(o, after);
+        }
         *o++ = '\n';
         w.Commit(o);
     }
@@ -202,22 +246,96 @@ std::string WriteText(const Document& doc) {
     return out;
 }
 
-bool WriteFileAtomic(const std::string& path, std::string_view text, std::string* error) {
-    auto fail = [&](int err) {
+namespace {
+
+// The file a save replaces: symbolic links followed to the file they name. False (with
+// errno set, or why filled) for a name that holds anything but a regular file.
+bool ResolveTarget(std::string& path, std::string& why) {
+    for (int hops = 0;; ++hops) {
+        struct stat st {};
+        if (::lstat(path.c_str(), &st) != 0)
+            return errno == ENOENT; // a new name
+        if (S_ISREG(st.st_mode))
+            return true;
+        if (S_ISDIR(st.st_mode)) {
+            errno = EISDIR;
+            return false;
+        }
+        if (!S_ISLNK(st.st_mode)) {
+            why = "not a regular file";
+            return false;
+        }
+        if (hops == 40) {
+            errno = ELOOP;
+            return false;
+        }
+        std::string target(static_cast<std::size_t>(st.st_size > 0 ? st.st_size : 255) + 1, '\0');
+        const ssize_t n = ::readlink(path.c_str(), target.data(), target.size());
+        if (n < 0)
+            return false;
+        target.resize(static_cast<std::size_t>(n));
+        const std::size_t slash = path.rfind('/');
+        if (!target.empty() && target[0] != '/' && slash != std::string::npos)
+            target = path.substr(0, slash + 1) + target;
+        path = std::move(target);
+    }
+}
+
+// Temporaries of saves killed before they finished: ".NAME.tmpPID_N" of processes gone.
+void RemoveStaleTemporaries(const std::string& dir, const std::string& base) {
+    DIR* d = ::opendir(dir.empty() ? "." : dir.c_str());
+    if (!d)
+        return;
+    const std::string prefix = "." + base + ".tmp";
+    while (const dirent* e = ::readdir(d)) {
+        const std::string_view name(e->d_name);
+        if (name.size() <= prefix.size() || name.substr(0, prefix.size()) != prefix)
+            continue;
+        const std::string_view rest = name.substr(prefix.size());
+        long pid = 0;
+        const auto [end, ec] = std::from_chars(rest.data(), rest.data() + rest.size(), pid);
+        if (ec != std::errc() || end == rest.data() + rest.size() || *end != '_' || pid <= 0)
+            continue;
+        bool digits = end + 1 < rest.data() + rest.size();
+        for (const char* c = end + 1; c < rest.data() + rest.size(); ++c)
+            digits = digits && *c >= '0' && *c <= '9';
+        if (!digits || pid == ::getpid())
+            continue;
+        if (::kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
+            ::unlink((dir + std::string(name)).c_str());
+    }
+    ::closedir(d);
+}
+
+} // namespace
+
+bool WriteFileAtomic(const std::string& requested, std::string_view text, std::string* error) {
+    auto refuse = [&](const std::string& why) {
         if (error)
-            *error = "cannot write '" + path + "': " + std::strerror(err);
+            *error = "cannot write '" + requested + "': " + why;
         return false;
     };
+    auto fail = [&](int err) { return refuse(std::strerror(err)); };
+    std::string path = requested;
+    std::string why;
+    if (!ResolveTarget(path, why))
+        return why.empty() ? fail(errno) : refuse(why);
     // The temporary lives beside the target: rename is atomic only within one file system.
     static std::atomic<unsigned> counter{0};
     const std::size_t slash = path.rfind('/');
     const std::string dir = slash == std::string::npos ? std::string() : path.substr(0, slash + 1);
     const std::string base = slash == std::string::npos ? path : path.substr(slash + 1);
+    RemoveStaleTemporaries(dir, base);
+    auto tmpName = [&] {
+        return dir + "." + base + ".tmp" + std::to_string(::getpid()) + "_" +
+               std::to_string(counter++);
+    };
     std::string tmp;
-    int fd = -1;
+    // Unnamed until complete, so that a process killed while writing leaves nothing.
+    int fd = ::open(dir.empty() ? "." : dir.c_str(), O_TMPFILE | O_WRONLY | O_CLOEXEC, 0666);
+    const bool unnamed = fd >= 0;
     for (int attempt = 0; fd < 0; ++attempt) {
-        tmp = dir + "." + base + ".tmp" + std::to_string(::getpid()) + "_" +
-              std::to_string(counter++);
+        tmp = tmpName();
         fd = ::open(tmp.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
         if (fd < 0 && (errno != EEXIST || attempt == 100))
             return fail(errno);
@@ -225,7 +343,8 @@ bool WriteFileAtomic(const std::string& path, std::string_view text, std::string
     auto abandon = [&](int err) {
         if (fd >= 0)
             ::close(fd);
-        ::unlink(tmp.c_str());
+        if (!tmp.empty())
+            ::unlink(tmp.c_str());
         return fail(err);
     };
     struct stat st {};
@@ -244,6 +363,19 @@ bool WriteFileAtomic(const std::string& path, std::string_view text, std::string
     }
     if (::fsync(fd) != 0)
         return abandon(errno);
+    if (unnamed) {
+        const std::string self = "/proc/self/fd/" + std::to_string(fd);
+        for (int attempt = 0;; ++attempt) {
+            tmp = tmpName();
+            if (::linkat(AT_FDCWD, self.c_str(), AT_FDCWD, tmp.c_str(), AT_SYMLINK_FOLLOW) == 0)
+                break;
+            if (errno != EEXIST || attempt == 100) {
+                const int err = errno;
+                tmp.clear();
+                return abandon(err);
+            }
+        }
+    }
     const int closed = ::close(fd);
     fd = -1;
     if (closed != 0)

@@ -11,6 +11,7 @@
 #include "common/Platform.h"
 #include "paramfile/Kiv.h"
 
+#include <cmath>
 #include <cstddef>
 #include <limits>
 
@@ -23,6 +24,21 @@ inline float ToFileFloat(double v) {
     if (v < -kMax)
         return -std::numeric_limits<float>::infinity();
     return static_cast<float>(v);
+}
+
+// Reads a double that the file holds as a float. A finite value beyond the float range
+// would be saved as an infinity, so it is refused with a warning and the value kept;
+// nan and inf read literally stay as they are.
+inline void ReadFileFloat(void* h, const char* keyword, double* value) {
+    double v = *value;
+    kivGetParam(h, keyword, &v, 1, 1);
+    if (std::isfinite(v) && std::fabs(v) > std::numeric_limits<float>::max()) {
+        kivWarn(h, keyword,
+                FormatString("'%s' value %g is out of range for a float; kept %g", keyword, v,
+                             *value));
+        return;
+    }
+    *value = v;
 }
 
 template <class O>
@@ -119,8 +135,8 @@ void ReadFields(void* h, O& o, const KivField<O> (&fields)[N]) {
     for (const KivField<O>& f : fields) {
         switch (f.kind) {
         case K::Int: kivGetParam(h, f.keyword, &(o.*f.intMember), 1, 1); break;
-        case K::Double:
-        case K::DoubleAsFloat: kivGetParam(h, f.keyword, &(o.*f.doubleMember), 1, 1); break;
+        case K::Double: kivGetParam(h, f.keyword, &(o.*f.doubleMember), 1, 1); break;
+        case K::DoubleAsFloat: ReadFileFloat(h, f.keyword, &(o.*f.doubleMember)); break;
         case K::Float: kivGetParam(h, f.keyword, &(o.*f.floatMember), 1, 1); break;
         case K::Bool: kivGetParam(h, f.keyword, &(o.*f.boolMember), 1, 1); break;
         case K::Flag: {

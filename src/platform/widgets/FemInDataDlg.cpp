@@ -68,9 +68,6 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
     grid->addWidget(m_itemName, 4, 1);
     grid->setColumnStretch(1, 1);
 
-    for (int format : m_data->AllowedFormats())
-        m_format->addItem(QString::fromStdString(CFemInDataKiv::FormatName(format)));
-
     SetConstantStyle(CZoEditStyle());
     m_constant->BindDouble(
         owner, [this] { return m_data->Constant(); }, [this](double v) { m_data->Constant(v); });
@@ -86,6 +83,8 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
 void CFemInDataDlg::SetConstantStyle(const CZoEditStyle& style) {
     CZoEditStyle s = style;
     s.SetOvuUnitBaseGroup(m_data->ItemType());
+    if (m_data->ConstantIsFloat())
+        s.SetFloatRange();
     m_constant->SetStyle(s);
     const CString unit = s.UnitName();
     m_unit->setText(unit == "()" ? QString() : QString::fromStdString(unit));
@@ -95,8 +94,16 @@ void CFemInDataDlg::SetData() {
     const std::vector<int> formats = m_data->AllowedFormats();
     const auto it = std::find(formats.begin(), formats.end(), m_data->Format());
     {
+        // A format read from a file that the value may not take is shown as it is, after
+        // the formats to choose from, until another is chosen.
         const QSignalBlocker block(m_format);
-        m_format->setCurrentIndex(it == formats.end() ? -1 : int(it - formats.begin()));
+        m_format->clear();
+        for (int format : formats)
+            m_format->addItem(QString::fromStdString(CFemInDataKiv::FormatName(format)));
+        if (it == formats.end())
+            m_format->addItem(QString::fromStdString(CFemInDataKiv::FormatName(m_data->Format())));
+        m_format->setCurrentIndex(it == formats.end() ? int(formats.size())
+                                                      : int(it - formats.begin()));
     }
     m_constant->Refresh();
     const CFemInDataFile* file = m_data->QrdData();

@@ -101,6 +101,12 @@ CZoEditStyle& CZoEditStyle::SetRange(double minimum, double maximum) {
     return SetMaximum(maximum);
 }
 
+CZoEditStyle& CZoEditStyle::SetFloatRange() {
+    constexpr double kMax = std::numeric_limits<float>::max();
+    SetMinimum(m_hasMin ? std::max(m_min, -kMax) : -kMax);
+    return SetMaximum(m_hasMax ? std::min(m_max, kMax) : kMax);
+}
+
 CZoEditStyle& CZoEditStyle::SetMinimum(double minimum) {
     m_hasMin = true;
     m_min = minimum;

@@ -21,6 +21,9 @@ public:
     CZoEditStyle& SetRange(double minimum, double maximum);
     CZoEditStyle& SetMinimum(double minimum);
     CZoEditStyle& SetMaximum(double maximum);
+    // For a value saved as a float: the range is narrowed to what a float holds, so that a
+    // number beyond it is refused rather than saved as an infinity.
+    CZoEditStyle& SetFloatRange();
     bool HasMinimum() const { return m_hasMin; }
     bool HasMaximum() const { return m_hasMax; }
     double Minimum() const { return m_min; }

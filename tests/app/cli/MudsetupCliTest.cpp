@@ -1,6 +1,7 @@
 // The command line run as a user runs it: exit codes, standard output and error, files.
 #include <gtest/gtest.h>
 
+#include <sys/stat.h>
 #include <sys/wait.h>
 
 #include <cstdio>
@@ -38,10 +39,11 @@ protected:
     }
     void TearDown() override { fs::remove_all(dir); }
 
-    Result Mudsetup(const std::string& args) {
+    // prefix: shell words before the command ("timeout 20 ", "ulimit -f 4; ").
+    Result Mudsetup(const std::string& args, const std::string& prefix = "") {
         const fs::path out = dir / "stdout.txt";
         const fs::path err = dir / "stderr.txt";
-        const std::string cmd = std::string(MUDSETUP_EXE) + " " + args + " >" + out.string() +
+        const std::string cmd = prefix + std::string(MUDSETUP_EXE) + " " + args + " >" + out.string() +
                                 " 2>" + err.string() + " </dev/null";
         const int status = std::system(cmd.c_str());
         return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadFile(out), ReadFile(err)};
@@ -112,7 +114,9 @@ TEST_F(Cli, WarningsGoToStandardErrorAndTheFileStillLoads) {
               "MUD_TRANSPORT_MODULE {\n    mode = 2\n    MODEL_DEFINITION {\n"
               "        number_of_fractions = \"two\"\n    }\n}\n");
     Result r = Mudsetup("validate " + P("odd.setup"));
-    EXPECT_EQ(r.exitCode, 0);
+    // The setup itself is valid, but the file does not hold what it says.
+    EXPECT_EQ(r.exitCode, 1);
+    EXPECT_EQ(r.out, "");
     EXPECT_EQ(r.err.rfind("warning: " + P("odd.setup") + ":4:", 0), 0u) << r.err;
 }
 
@@ -137,6 +141,124 @@ TEST_F(Cli, OutputThatCannotBeWrittenIsAFailure) {
         ASSERT_TRUE(WIFEXITED(status)) << args;
         EXPECT_EQ(WEXITSTATUS(status), 2) << args;
     }
+}
+
+// Files that read with warnings: validate lists them and exits 1; format in place writes
+// nothing (byte for byte) when it would drop reported content, unless --force.
+TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
+    const std::string model = "MUD_TRANSPORT_MODULE {\n    mode = 2\n    MODEL_DEFINITION {\n"
+                              "        number_of_fractions = 1\n        number_of_layers = 1\n";
+    struct Case {
+        const char* name;
+        std::string text;
+        const char* warning; // on standard error, with FILE:LINE:COLUMN; null for none
+        int validate;
+        int format;
+    };
+    const Case cases[] = {
+        {"clean", model + "    }\n}\n", nullptr, 0, 0},
+        {"unknown section", model + "    }\n    OUTPUTS {\n        a = 1\n    }\n}\n",
+         ":7:5: unknown section 'OUTPUTS'", 1, 1},
+        {"nested unknown section",
+         model + "    }\n    FORCINGS {\n        WAVES {\n        }\n    }\n}\n",
+         ":8:9: unknown section 'WAVES'", 1, 1},
+        {"count no setup holds",
+         "MUD_TRANSPORT_MODULE {\n    MODEL_DEFINITION {\n"
+         "        number_of_fractions = 2000000000\n    }\n}\n",
+         ":3:9: ", 1, 0},
+        {"counts that disagree",
+         model + "    }\n    BED {\n        BED_DENSITY {\n            ZoSEKivListItemCount = 3\n"
+                 "        }\n    }\n}\n",
+         ":9:13: ZoSEKivListItemCount = 3, but the setup has 1 layer", 1, 0},
+        {"empty file", "", ":1:1: no section 'MUD_TRANSPORT_MODULE'", 1, 0},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.name);
+        const fs::path file = dir / "case.setup";
+        WriteFile(file, c.text);
+        Result v = Mudsetup("validate " + file.string());
+        EXPECT_EQ(v.exitCode, c.validate) << v.out << v.err;
+        if (c.warning)
+            EXPECT_NE(v.err.find("warning: " + file.string() + c.warning), std::string::npos)
+                << v.err;
+        else
+            EXPECT_EQ(v.err, "");
+        Result f = Mudsetup("format " + file.string());
+        EXPECT_EQ(f.exitCode, c.format) << f.err;
+        if (c.format == 1) {
+            EXPECT_EQ(ReadFile(file), c.text);
+            EXPECT_NE(f.err.find("not written: saving would drop the entry reported above; "
+                                 "--force writes it anyway"),
+                      std::string::npos)
+                << f.err;
+            EXPECT_EQ(Mudsetup("format " + file.string() + " -o -").exitCode, 0);
+            EXPECT_EQ(ReadFile(file), c.text);
+            Result forced = Mudsetup("format --force " + file.string());
+            EXPECT_EQ(forced.exitCode, 0) << forced.err;
+            EXPECT_NE(ReadFile(file), c.text);
+        }
+    }
+    EXPECT_NE(Mudsetup("format --help").out.find("--force"), std::string::npos);
+}
+
+// Only regular files are read: a device, a FIFO or a folder is refused at once.
+TEST_F(Cli, InputThatIsNoSetupFileIsRefused) {
+    ASSERT_EQ(::mkfifo(P("fifo").c_str(), 0600), 0);
+    fs::create_directory(dir / "folder");
+    WriteFile(dir / "huge.setup", "");
+    fs::resize_file(dir / "huge.setup", 3ull << 30);  // sparse: no room taken
+    const struct {
+        std::string input;
+        const char* why;
+    } cases[] = {
+        {"/dev/zero", "not a regular file"},
+        {P("fifo"), "not a regular file"},
+        {P("folder"), "Is a directory"},
+        {P("huge.setup"), "larger than 2147483646 bytes"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.input);
+        // A reader that waited or read on would be stopped by timeout (exit 124).
+        Result r = Mudsetup("validate " + c.input, "timeout 20 ");
+        EXPECT_EQ(r.exitCode, 2);
+        EXPECT_EQ(r.err, c.input + ":0:0: cannot read '" + c.input + "': " + c.why + "\n");
+    }
+}
+
+// Saving replaces only regular files (through links); a size limit fails the save cleanly,
+// and what a killed save left behind goes with the next save.
+TEST_F(Cli, OutputGoesOnlyWhereASetupBelongs) {
+    WriteFile(dir / "real.setup", "MUD_TRANSPORT_MODULE {\nmode = 2\n}\n");
+    const std::string canonical = Mudsetup("format " + P("real.setup") + " -o -").out;
+    fs::create_symlink("real.setup", dir / "link.setup");
+    Result r = Mudsetup("format " + P("link.setup"));
+    EXPECT_EQ(r.exitCode, 0) << r.err;
+    EXPECT_TRUE(fs::is_symlink(dir / "link.setup"));
+    EXPECT_TRUE(ReadFile(dir / "real.setup") == canonical);
+
+    ASSERT_EQ(::mkfifo(P("fifo").c_str(), 0600), 0);
+    for (const std::string& output : {P("fifo"), std::string("/dev/null")}) {
+        SCOPED_TRACE(output);
+        r = Mudsetup("format " + P("real.setup") + " -o " + output, "timeout 20 ");
+        EXPECT_EQ(r.exitCode, 2);
+        EXPECT_NE(r.err.find("cannot write '" + output + "': not a regular file"),
+                  std::string::npos)
+            << r.err;
+    }
+    EXPECT_TRUE(fs::is_fifo(dir / "fifo"));
+    EXPECT_TRUE(fs::is_character_file("/dev/null"));
+
+    // A pid above any pid_max is of no living process.
+    WriteFile(dir / ".real.setup.tmp4194305_0", "half");
+    r = Mudsetup("new --fractions 8 --layers 12 -o " + P("real.setup"), "ulimit -f 4; ");
+    EXPECT_EQ(r.exitCode, 2);
+    EXPECT_NE(r.err.find("cannot write '" + P("real.setup") + "': File too large"),
+              std::string::npos)
+        << r.err;
+    EXPECT_TRUE(ReadFile(dir / "real.setup") == canonical);
+    for (const auto& e : fs::directory_iterator(dir))
+        EXPECT_EQ(e.path().filename().string().find(".real.setup.tmp"), std::string::npos)
+            << e.path();
 }
 
 TEST_F(Cli, HelpAndBadArguments) {

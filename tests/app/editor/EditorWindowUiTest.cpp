@@ -390,6 +390,33 @@ TEST_F(EditorTest, WarningsFromReadingAreListed) {
     EXPECT_EQ(m_window->Document().GetPeriod()->TimeStepCount(), 0);
 }
 
+TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
+    QByteArray text = ReadAll(kExample);
+    text.replace("MUD_TRANSPORT_MODULE {\n", "MUD_TRANSPORT_MODULE {\n    OUTPUTS {\n    }\n");
+    const QString path = m_dir.filePath("newer.setup");
+    ASSERT_TRUE(WriteAll(path, text));
+    ASSERT_TRUE(m_window->OpenFile(path));
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
+    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).contains("unknown section 'OUTPUTS'"));
+    // Validation keeps the warnings of reading above its own messages.
+    m_window->Validate();
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 2);
+    EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).startsWith("warning: "));
+
+    m_answer = QMessageBox::Cancel;
+    EXPECT_FALSE(m_window->SaveFile(path));
+    ASSERT_EQ(m_prompts.size(), 1u);
+    EXPECT_TRUE(m_prompts[0].contains("unknown section 'OUTPUTS'"));
+    EXPECT_EQ(ReadAll(path), text);
+
+    m_answer = QMessageBox::Save;
+    EXPECT_TRUE(m_window->SaveFile(path));
+    EXPECT_FALSE(ReadAll(path).contains("OUTPUTS"));
+    // Once saved, the setup and the file agree: nothing more to ask.
+    EXPECT_TRUE(m_window->SaveFile(path));
+    EXPECT_EQ(m_prompts.size(), 2u);
+}
+
 TEST_F(EditorTest, TheTreeFollowsTheModelAndLosesRemovedSections) {
     ASSERT_TRUE(m_window->OpenFile(CopyOfExample()));
     CParameterSelectionKiv* model = ModelDefinition(m_window->Document().Module());

@@ -236,13 +236,60 @@ TEST(ParamFileReader, RealReadAsFloatIsTheFloatOfTheText) {
     EXPECT_EQ(Bits(f), Bits(std::nextafter(1.0f, 2.0f)));
 }
 
+TEST(ParamFileReader, WhatNoLookUpFoundIsReportedOnceAtItsPlace) {
+    auto doc = Parse("A {\n    k = 1\n    k = 2\n    typo = 3\n    S {\n        x = 1\n        y = 2\n"
+                     "    }\n    S {\n    }\n    NEW {\n        z = 1\n    }\n}\n");
+    const Section& a = *doc->Root().FindSection("A");
+    ASSERT_NE(a.FindKeyword("k"), nullptr);
+    const Section* s = a.FindSection("S");
+    ASSERT_NE(s, nullptr);
+    ASSERT_NE(s->FindKeyword("x"), nullptr);
+    EXPECT_TRUE(s->WasFound());
+    // Walking the entries is no look-up.
+    EXPECT_FALSE(a.SectionAt(a.EntryCount() - 1).WasFound());
+    EXPECT_FALSE(a.SectionAt(a.EntryCount() - 1).KeywordAt(0).WasFound());
+    std::vector<std::string> got;
+    for (const Diagnostic& d : UnreadEntries(a, "A"))
+        got.push_back(d.ToString());
+    EXPECT_EQ(got, (std::vector<std::string>{
+                       "test.par:3:5: keyword 'k' repeated in A: only the first is read, this "
+                       "one is dropped on saving",
+                       "test.par:4:5: unknown keyword 'typo' in A: not read, dropped on saving",
+                       "test.par:7:9: unknown keyword 'y' in A/S: not read, dropped on saving",
+                       "test.par:9:5: section 'S' repeated in A: only the first is read, this "
+                       "one is dropped on saving",
+                       "test.par:11:5: unknown section 'NEW' in A: not read, dropped on saving",
+                   }));
+}
+
+TEST(ParamFileBuilder, CommentsFollowTheirEntriesIntoCopiesAndRebuiltSections) {
+    auto source = Parse("# head\nA { # a\n    # before k\n    k = 1 # on k\n    # end of A\n}\n"
+                        "B {\n    # before m\n    m = 2\n}\n# tail\n");
+    Document out;
+    {
+        Builder b(out);
+        b.TakeCommentsFrom(*source);
+        b.CopySection(*source->Root().FindSection("A"));
+        // Rebuilt by name: the comments of the namesakes come along, new entries have none.
+        b.BeginSection("B");
+        b.AddKeyword("new");
+        b.AddInt(3);
+        b.AddKeyword("m");
+        b.AddInt(4);
+        b.EndSection();
+    }
+    EXPECT_EQ(WriteText(out), "# head\nA { # a\n    # before k\n    k = 1 # on k\n    # end of A\n}\n"
+                              "B {\n    new = 3\n    # before m\n    m = 4\n}\n# tail\n");
+}
+
 // --- writer ------------------------------------------------------------------------------
 
 TEST(ParamFileWriter, WritesCanonicalFormAndIsIdempotent) {
     const std::string messy = "# comment\nTop{a=1,2 ,3\n  Inner {\n\t\tb =\n"
                               "   c = 1e7,0.001,-.33, 100.0, 123456789012345680.0\n"
                               "d = \"tab\there\" , 'it''s'\n}}\nNext {\n}\n";
-    const std::string want = "Top {\n"
+    const std::string want = "# comment\n"
+                             "Top {\n"
                              "    a = 1, 2, 3\n"
                              "    Inner {\n"
                              "        b =\n"

@@ -110,6 +110,17 @@ TEST_F(FieldDialog, RefusedEntriesLeaveTheValueAndShowItAgain) {
                                     "Please enter a number."}));
     Enter(field, "10");
     EXPECT_DOUBLE_EQ(velocity, 0.01);
+
+    // A double saved as a float: beyond the float range is refused, not saved as inf.
+    double concentration = 50.0;
+    auto* big = new CZoNumberEdit(CZoEditStyle().SetFloatRange(), &dialog);
+    big->BindDouble(&dialog, concentration);
+    Enter(big, "1e42");
+    EXPECT_EQ(concentration, 50.0);
+    EXPECT_EQ(messages.Messages().back(),
+              "Please enter a number between -3.4028234663852886e+38 and 3.4028234663852886e+38.");
+    Enter(big, "3e38");
+    EXPECT_EQ(concentration, 3e38);
 }
 
 TEST_F(FieldDialog, FloatsIntsAndFormatsShowAndReadAsTheirKind) {
@@ -222,6 +233,17 @@ TEST_F(InDataSubForm, BadItemNumbersAndCancelledBrowsingStoreNothing) {
     QTest::mouseClick(form->BrowseButton(), Qt::LeftButton);
     EXPECT_EQ(data->QrdData()->FileName(), "");
     EXPECT_TRUE(host.hints.empty());
+}
+
+TEST_F(InDataSubForm, AFormatTheValueMayNotTakeIsShownAsRead) {
+    data->Format(8);  // vertical, from a file; the value varies in time and domain only
+    form->SetData();
+    QComboBox* format = form->FormatBox();
+    EXPECT_EQ(format->currentText(), "Varying in vertical");
+    EXPECT_EQ(format->count(), 5);
+    Choose(format, "Varying in domain");
+    EXPECT_EQ(data->Format(), 2);
+    EXPECT_EQ(format->count(), 4);
 }
 
 TEST_F(InDataSubForm, DisabledFormsAndValuesOfferNoControls) {
