@@ -3,7 +3,7 @@
 #include "ForcingsWaveDBFile.h"
 
 CForcingsWaveDBItemKiv::CForcingsWaveDBItemKiv(CZoSEKivBase* parent)
-    : CZoSEKivBase("Wave Database Item", "", parent), m_file(new CForcingsWaveDBFile(this)) {
+    : CZoSEKivBase("Wave Database Item %d", "", parent), m_file(new CForcingsWaveDBFile(this)) {
     AddChild(m_file);
 }
 

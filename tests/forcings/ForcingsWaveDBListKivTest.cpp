@@ -306,7 +306,7 @@ TEST(ForcingsWaveDBFile, FilesAreCheckedOnlyForTheDatabaseType) {
         EXPECT_EQ(messages, c.valid ? std::vector<std::string>{}
                                     : std::vector<std::string>{
                                           "MUD_TRANSPORT_MODULE/FORCINGS/WAVES/WAVE_DATABASE/"
-                                          "Wave Database Item/MT Waves Database file: File is not "
-                                          "valid"});
+                                          "Wave Database Item 1/MT Waves Database file: File is "
+                                          "not valid"});
     }
 }
