@@ -105,12 +105,15 @@ TEST(MTBedRoughnessKiv, NegativeConstantFailsWhateverTheFormat) {
               (std::vector<std::string>{kRoughnessMessage}));
     EXPECT_EQ(roughness->Roughness()->Constant(), -0.001);  // left as entered
 
-    // A data file in use does not excuse the constant.
+    // A data file in use does not excuse the constant (and a file that is not there is
+    // reported besides).
     roughness->Roughness()->Format(2);
     roughness->Roughness()->QrdData()->FileName("roughness.qrd2");
     EXPECT_EQ(doc->ValidateAll(), 0);
     EXPECT_EQ(MessagesUnder(*doc, "MUD_TRANSPORT_MODULE/BED"),
-              (std::vector<std::string>{kRoughnessMessage}));
+              (std::vector<std::string>{kRoughnessMessage,
+                                        "MUD_TRANSPORT_MODULE/BED/ROUGHNESS: The data file for the "
+                                        "value is not valid: roughness.qrd2: the file does not exist"}));
 }
 
 TEST(MTBedRoughnessKiv, ConstantThatIsNotANumberFails) {

@@ -95,7 +95,7 @@ HeaderResult ParseHeader(std::string_view text, const std::string& name);
 struct ValuesRequest {
     std::vector<int> items;
     std::int64_t point = 0;
-    std::int64_t maxSteps = kMaxSteps;
+    std::int64_t maxSteps = 1000000;
     bool check = true;  // read to the end and check the number of values
 };
 

@@ -1,5 +1,7 @@
 #include "FemInDataKiv.h"
 
+#include "SimulationPeriodKiv.h"
+#include "datafile/ZoFileSelector.h"
 #include "paramfile/Kiv.h"
 
 CString CFemInDataFile::ItemString() const {
@@ -135,7 +137,31 @@ int CFemInDataKiv::ValidateData() {
                                   what.c_str()));
             return 0;
         }
+    CZoFileSelector selector(this);
+    SetUpFileSelector(selector);
+    CString error;
+    if (!selector.IsQrdFileValid(m_file.FileName(), m_file.ItemNumbers(), &error)) {
+        AddError("The data file for " + what + " is not valid: " + error);
+        return 0;
+    }
     return 1;
+}
+
+void CFemInDataKiv::SetUpFileSelector(CZoFileSelector& selector) const {
+    const CString title = GetTitle();
+    CZoItemRequest& request = selector.AddRequest(title.empty() ? CString("Value") : title);
+    std::vector<long> types{m_itemType};
+    types.insert(types.end(), m_furtherItemTypes.begin(), m_furtherItemTypes.end());
+    request.SetMultiOvuType(types);
+    selector.SetMinNoItems(1);
+    // Values in time come from time series; values over the domain from grids or mesh data.
+    if (m_format == 1)
+        selector.SetAcceptedKinds({datafile::Kind::TimeSeries});
+    else if (m_format & 2)
+        selector.SetAcceptedKinds({datafile::Kind::Grid, datafile::Kind::MeshData});
+    if (m_format & 1)
+        if (const CSimulationPeriodKiv* period = SimulationPeriod(this))
+            period->SetUpQrdValidation_SimulationPeriod(selector);
 }
 
 void CFemInDataKiv::SetDefault() {

@@ -5,6 +5,8 @@
 
 #include <vector>
 
+class CZoFileSelector;
+
 // The data file of a data-input value.
 class CFemInDataFile {
 public:
@@ -51,6 +53,10 @@ public:
     bool Flag2() const { return m_flag2; }
     CFemInDataFile* QrdData() { return &m_file; }
     const CFemInDataFile* QrdData() const { return &m_file; }
+
+    // What the value asks of its data file: one item of its item type (or a further one),
+    // of a kind that fits the format, and for a format varying in time the period covered.
+    void SetUpFileSelector(CZoFileSelector& selector) const;
 
     // The formats this value may take, constant first.
     std::vector<int> AllowedFormats() const;

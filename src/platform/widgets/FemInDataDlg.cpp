@@ -1,5 +1,7 @@
 #include "FemInDataDlg.h"
 
+#include "FemBase.h"
+#include "ZoFileSelectorDlg.h"
 #include "ZoNumberEdit.h"
 #include "ZoPrompts.h"
 #include "ZoSEDlgBase.h"
@@ -7,8 +9,10 @@
 
 #include <QComboBox>
 #include <QGridLayout>
+#include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPushButton>
 #include <QRegularExpression>
 #include <QSignalBlocker>
 #include <QToolButton>
@@ -41,13 +45,17 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
     : QWidget(parent), m_data(data), m_owner(owner), m_format(new QComboBox(this)),
       m_constant(new CZoNumberEdit(this)), m_unit(new QLabel(this)),
       m_fileName(new QLineEdit(this)), m_browse(new QToolButton(this)),
-      m_items(new QLineEdit(this)), m_itemName(new QLineEdit(this)) {
+      m_items(new QLineEdit(this)), m_itemName(new QLineEdit(this)),
+      m_select(new QPushButton(tr("Select ..."), this)), m_view(new QPushButton(tr("View ..."), this)) {
     m_format->setObjectName("format");
     m_constant->setObjectName("constant");
     m_fileName->setObjectName("fileName");
     m_browse->setObjectName("browse");
     m_items->setObjectName("itemNumbers");
     m_itemName->setObjectName("itemName");
+    m_select->setObjectName("select");
+    m_view->setObjectName("view");
+    m_select->setToolTip("Choose the data file and its item with the file selector");
     m_browse->setText("...");
     m_browse->setToolTip("Select the data file");
     m_items->setToolTip("Item numbers of the data file, separated by commas");
@@ -66,6 +74,11 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
     grid->addWidget(m_items, 3, 1);
     grid->addWidget(new QLabel("Item name", this), 4, 0);
     grid->addWidget(m_itemName, 4, 1);
+    auto* buttons = new QHBoxLayout;
+    buttons->addStretch(1);
+    buttons->addWidget(m_select);
+    buttons->addWidget(m_view);
+    grid->addLayout(buttons, 5, 1, 1, 2);
     grid->setColumnStretch(1, 1);
 
     SetConstantStyle(CZoEditStyle());
@@ -77,6 +90,8 @@ CFemInDataDlg::CFemInDataDlg(CFemInDataKiv* data, CZoSEDlgBase* owner, QWidget* 
     connect(m_browse, &QToolButton::clicked, this, &CFemInDataDlg::OnBrowse);
     connect(m_items, &QLineEdit::editingFinished, this, &CFemInDataDlg::OnItemNumbersEdited);
     connect(m_itemName, &QLineEdit::editingFinished, this, &CFemInDataDlg::OnItemNameEdited);
+    connect(m_select, &QPushButton::clicked, this, &CFemInDataDlg::OnSelect);
+    connect(m_view, &QPushButton::clicked, this, &CFemInDataDlg::OnView);
     SetData();
 }
 
@@ -117,8 +132,49 @@ void CFemInDataDlg::SetData() {
     m_constant->setEnabled(on && constant);
     m_unit->setEnabled(on && constant);
     for (QWidget* w : {static_cast<QWidget*>(m_fileName), static_cast<QWidget*>(m_browse),
-                       static_cast<QWidget*>(m_items), static_cast<QWidget*>(m_itemName)})
+                       static_cast<QWidget*>(m_items), static_cast<QWidget*>(m_itemName),
+                       static_cast<QWidget*>(m_select)})
         w->setEnabled(on && !constant);
+    bool readable = false;
+    if (on && !constant && !file->FileName().empty()) {
+        const auto header = CZoFileSelector(m_data).Header(file->FileName());
+        readable = header->header.has_value();
+    }
+    m_view->setEnabled(readable);
+}
+
+namespace {
+// The files a format reads: time series for values in time, grids and mesh data in space.
+const char* FilterFor(int format) {
+    if (format == 1)
+        return "Time series files (*.qrd0)|*.qrd0;*.kx0|All files (*.*)|*.*||";
+    return "Unstructured data files (*.qrdu)|*.qrdu|2D grid files (*.qrd2)|*.qrd2;*.kx2|"
+           "All files (*.*)|*.*||";
+}
+}  // namespace
+
+void CFemInDataDlg::OnSelect() {
+    CFemInDataFile* file = m_data->QrdData();
+    const int format = m_data->Format();
+    CZoFileSelectorDlg dialog(file->FileName(), FilterFor(format), format == 1 ? "qrd0" : "qrdu",
+                              this);
+    dialog.SetBaseFolder(CZoFileSelector(m_data).BaseFolder());
+    m_data->SetUpFileSelector(dialog);
+    dialog.SetSelectedItems(file->ItemNumbers());
+    QPointer<CFemInDataDlg> self(this);
+    if (ZoRunFileSelector(dialog) != QDialog::Accepted || !self)
+        return;
+    file->FileName(dialog.FileName());
+    file->ItemNumbers(dialog.SelectedItems());
+    file->ItemName(dialog.SelectedItems().empty() ? CString()
+                                                  : dialog.GetNameOfItem(dialog.SelectedItems().front()));
+    Changed();
+}
+
+void CFemInDataDlg::OnView() {
+    const CFemInDataFile* file = m_data->QrdData();
+    CFemBase::OpenDataFile(CZoFileSelector(m_data).AbsolutePath(file->FileName()), file->ItemNumbers(),
+                           this);
 }
 
 void CFemInDataDlg::EnableControls(bool enable) {

@@ -15,6 +15,7 @@ class CZoNumberEdit;
 class QComboBox;
 class QLabel;
 class QLineEdit;
+class QPushButton;
 class QToolButton;
 
 class CFemInDataDlg : public QWidget {
@@ -36,6 +37,8 @@ public:
     QToolButton* BrowseButton() const { return m_browse; }
     QLineEdit* ItemNumbersEdit() const { return m_items; }
     QLineEdit* ItemNameEdit() const { return m_itemName; }
+    QPushButton* SelectButton() const { return m_select; }
+    QPushButton* ViewButton() const { return m_view; }
 
 private:
     void Changed();
@@ -44,6 +47,8 @@ private:
     void OnBrowse();
     void OnItemNumbersEdited();
     void OnItemNameEdited();
+    void OnSelect();
+    void OnView();
 
     CFemInDataKiv* m_data;
     QPointer<CZoSEDlgBase> m_owner;
@@ -55,6 +60,8 @@ private:
     QToolButton* m_browse;
     QLineEdit* m_items;
     QLineEdit* m_itemName;
+    QPushButton* m_select;
+    QPushButton* m_view;
 };
 
 // The sub-forms of a dialog's data-input values, shown one at a time in the dialog's frame.

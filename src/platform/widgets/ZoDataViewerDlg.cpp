@@ -336,7 +336,9 @@ void CZoDataViewerDlg::Load() {
 
 CZoDataViewerDlg* CFemBase::OpenDataFile(const CString& path, const std::vector<int>& items,
                                          QWidget* parent) {
-    auto* viewer = new CZoDataViewerDlg(path, items, parent);
+    // A window of its own beside the editor's, not closed when the page that opened it goes.
+    auto* viewer = new CZoDataViewerDlg(path, items, parent ? parent->window() : nullptr);
+    viewer->setWindowFlag(Qt::Window);
     viewer->setAttribute(Qt::WA_DeleteOnClose);
     viewer->show();
     return viewer;

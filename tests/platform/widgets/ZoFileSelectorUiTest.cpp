@@ -1,9 +1,12 @@
 // The file selector and the data viewer as a user drives them, on the example's data files.
 #include "datafile/DataFileCache.h"
+#include "fem/FemInDataKiv.h"
+#include "fem/SimulationPeriodKiv.h"
 #include "host/SetupDocument.h"
 #include "setupeditor/ZoSEQrdSelection.h"
 #include "support/UiTestSupport.h"
 #include "widgets/FemBase.h"
+#include "widgets/FemInDataDlg.h"
 #include "widgets/ZoDataViewerDlg.h"
 #include "widgets/ZoFileSelectorDlg.h"
 
@@ -236,5 +239,64 @@ TEST(DataViewer, SpatialFilesShowOnePointAtATimeAndBadFilesSayWhy) {
     EXPECT_TRUE(bad.StatusLabel()->text().endsWith("bad.qrd0:3:1: the header ends without a \"values\" line (the file is cut short)"))
         << bad.StatusLabel()->text().toStdString();
     EXPECT_EQ(bad.Table()->model()->rowCount(), 0);
+    fs::remove_all(dir);
+}
+
+TEST(DataInputValue, SelectsItsFileAndItemWithTheSelectorAndViewsIt) {
+    const fs::path dir = fs::temp_directory_path() / "mudsetup-indata-ui";
+    fs::remove_all(dir);
+    fs::create_directories(dir / "data");
+    fs::copy_file(kData + "/waves_mouth.qrd0", dir / "data" / "waves_mouth.qrd0");
+    CSetupDocument doc;
+    std::string error;
+    ASSERT_TRUE(doc.SaveAs((dir / "estuary.setup").string(), &error)) << error;
+    doc.GetPeriod()->StartTime("2021-06-02 00:00:00");
+    doc.GetPeriod()->TimeStepCount(10);
+    auto* value = new CFemInDataKiv("WAVE_HEIGHT", "Wave height", 3, false, false, 1.0, 100084, &doc);
+    doc.AddChild(value);
+    value->Format(1);
+    CRecordingHost host;
+    CZoSEDlgBase owner;
+    owner.Attach(value, &host);
+    CFemInDataDlg form(value, &owner, &owner);
+    owner.show();
+    EXPECT_TRUE(form.SelectButton()->isEnabled());
+    EXPECT_FALSE(form.ViewButton()->isEnabled());
+
+    FileChooserStub chooser(QString::fromStdString((dir / "data" / "waves_mouth.qrd0").string()));
+    const ZoFileSelectorHook previous = ZoSetFileSelectorHook([](CZoFileSelectorDlg& d) {
+        d.Prepare();
+        EXPECT_EQ(d.RequestCount(), 1);
+        EXPECT_EQ(d.Request(0).Description(), "Wave height");
+        EXPECT_TRUE(d.HasTimeValidation());
+        QTest::mouseClick(Child<QPushButton>(&d, "browse"), Qt::LeftButton);
+        EXPECT_FALSE(d.AssignItem(0, 2));  // the wave period
+        EXPECT_TRUE(d.AssignItem(0, 1));
+        QTest::mouseClick(d.OkButton(), Qt::LeftButton);
+        return d.result();
+    });
+    QTest::mouseClick(form.SelectButton(), Qt::LeftButton);
+    ZoSetFileSelectorHook(previous);
+    EXPECT_EQ(value->QrdData()->FileName(), "data/waves_mouth.qrd0");
+    EXPECT_EQ(value->QrdData()->ItemNumbers(), std::vector<int>{1});
+    EXPECT_EQ(value->QrdData()->ItemName(), "height");
+    EXPECT_EQ(host.hints, std::vector<int>{1});
+    EXPECT_EQ(form.FileNameEdit()->text(), "data/waves_mouth.qrd0");
+    EXPECT_EQ(value->ValidateData(), 1);
+
+    ASSERT_TRUE(form.ViewButton()->isEnabled());
+    QTest::mouseClick(form.ViewButton(), Qt::LeftButton);
+    CZoDataViewerDlg* viewer = owner.findChild<CZoDataViewerDlg*>();
+    ASSERT_TRUE(viewer);
+    EXPECT_EQ(viewer->Items(), std::vector<int>{1});
+    viewer->close();
+
+    // The period past the file's end makes the value invalid, with the reason.
+    doc.GetPeriod()->TimeStepCount(1000000);
+    doc.ClearErrors();
+    EXPECT_EQ(value->ValidateData(), 0);
+    ASSERT_EQ(doc.Errors().size(), 1u);
+    EXPECT_NE(doc.Errors()[0].message.find("does not cover the simulation period"), std::string::npos)
+        << doc.Errors()[0].message;
     fs::remove_all(dir);
 }
