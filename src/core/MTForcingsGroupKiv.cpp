@@ -1,6 +1,8 @@
 #include "MTForcingsGroupKiv.h"
 
+#include "forcings/ForcingsWavesKiv.h"
+
 CMTForcingsGroupKiv::CMTForcingsGroupKiv(CZoSEKivBase* parent)
     : CMTGroupKiv("Forcings", "FORCINGS", parent, 5028, "CMTGroupDlg") {
-    // Children in file order; each section joins here.
+    AddChild(new CForcingsWavesKiv(this));
 }

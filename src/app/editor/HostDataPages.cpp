@@ -141,6 +141,13 @@ public:
         f->addRow(m_mud);
         f->addRow(m_mudNote);
         f->addRow(m_waves);
+        m_decoupled = new QCheckBox(tr("Decoupled: the flow is read from stored results"), this);
+        m_decoupled->setObjectName("decoupledSimulation");
+        f->addRow(m_decoupled);
+        connect(m_decoupled, &QCheckBox::clicked, this, [this](bool on) {
+            Node()->DecoupledSimulation(on);
+            UpdateDoc(kHintValueChanged);
+        });
         connect(m_mud, &QCheckBox::clicked, this, [this](bool on) {
             Node()->Mode(on ? 2 : 0);
             UpdateDoc(kHintValueChanged);
@@ -152,7 +159,7 @@ public:
         Finish();
     }
     void SetData() override {
-        const QSignalBlocker b1(m_mud), b2(m_waves);
+        const QSignalBlocker b1(m_mud), b2(m_waves), b3(m_decoupled);
         const int mode = Node()->Mode();
         m_mud->setChecked(mode == 2);
         m_mudNote->setText(mode == 2 || mode == 0
@@ -160,6 +167,7 @@ public:
                                : tr("Mode %1 is stored; the module is used with mode 2.").arg(mode));
         m_mudNote->setVisible(!m_mudNote->text().isEmpty());
         m_waves->setChecked(Node()->SpectralWaveMode() >= 1);
+        m_decoupled->setChecked(Node()->DecoupledSimulation());
     }
 
 private:
@@ -167,6 +175,7 @@ private:
     QCheckBox* m_mud = nullptr;
     QLabel* m_mudNote = nullptr;
     QCheckBox* m_waves = nullptr;
+    QCheckBox* m_decoupled = nullptr;
 };
 
 // --- domain ----------------------------------------------------------------------------

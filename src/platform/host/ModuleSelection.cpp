@@ -7,6 +7,7 @@ struct ModuleSelectionFields {
     static inline const F kFields[] = {
         F::Int("mud_transport_mode", &CModuleSelection::m_mudTransportMode, 2),
         F::Int("spectral_wave_mode", &CModuleSelection::m_spectralWaveMode, 0),
+        F::Flag("decoupled_simulation", &CModuleSelection::m_decoupled, false),
     };
 };
 

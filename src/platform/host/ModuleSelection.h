@@ -13,6 +13,9 @@ public:
     void Mode(int mode) { m_mudTransportMode = mode; }
     int SpectralWaveMode() const { return m_spectralWaveMode; }
     void SpectralWaveMode(int mode) { m_spectralWaveMode = mode; }
+    // The flow is read from stored results instead of computed (the document's flag).
+    bool DecoupledSimulation() const { return m_decoupled; }
+    void DecoupledSimulation(bool decoupled) { m_decoupled = decoupled; }
 
     void WriteData(void* h) override;
     void ReadData(void* h) override;
@@ -22,6 +25,7 @@ private:
     friend struct ModuleSelectionFields;
     int m_mudTransportMode = 0;
     int m_spectralWaveMode = 0;
+    bool m_decoupled = false;
 };
 
 CModuleSelection* ModuleSelection(const CZoSEKivBase* node);

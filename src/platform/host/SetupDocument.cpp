@@ -40,6 +40,10 @@ CString CSetupDocument::DocumentFolder() const {
     return full.lexically_normal().parent_path().string();
 }
 
+int CSetupDocument::DecoupledSimulation() const {
+    return m_moduleSelection->DecoupledSimulation() ? 1 : 0;
+}
+
 CBoundaryNamesKiv* CSetupDocument::GetBoundaryNames() const { return m_domain->BoundaryNames(); }
 
 void CSetupDocument::SelectTreeItem(CZoSEKivBase* node) {

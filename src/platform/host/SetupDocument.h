@@ -55,6 +55,8 @@ public:
 
     const std::string& FileName() const { return m_fileName; }
     CString DocumentFolder() const override;
+    // Kept with the module selection.
+    int DecoupledSimulation() const override;
     CMudTransportModuleKiv* Module() const { return m_module; }
     CModuleSelection* GetModuleSelection() const { return m_moduleSelection; }
     CDomainKiv* GetDomain() const { return m_domain; }

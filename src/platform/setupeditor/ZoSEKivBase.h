@@ -131,6 +131,9 @@ public:
     // The folder of the setup file, against which relative data-file names are taken;
     // empty for a document that has no file (names are then taken as they stand).
     virtual CString DocumentFolder() const { return {}; }
+    // 1 when the setup runs decoupled from stored flow results, so that no other module's
+    // simulation (a spectral-wave one) runs alongside; 0 otherwise.
+    virtual int DecoupledSimulation() const { return 0; }
 
 private:
     struct Entry {

@@ -160,8 +160,8 @@ TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
         {"unknown section", model + "    }\n    PARTICLE_TRACKING {\n        a = 1\n    }\n}\n",
          ":7:5: unknown section 'PARTICLE_TRACKING'", 1, 1},
         {"nested unknown section",
-         model + "    }\n    FORCINGS {\n        WAVES {\n        }\n    }\n}\n",
-         ":8:9: unknown section 'WAVES'", 1, 1},
+         model + "    }\n    FORCINGS {\n        TIDES {\n        }\n    }\n}\n",
+         ":8:9: unknown section 'TIDES'", 1, 1},
         {"count no setup holds",
          "MUD_TRANSPORT_MODULE {\n    MODEL_DEFINITION {\n"
          "        number_of_fractions = 2000000000\n    }\n}\n",

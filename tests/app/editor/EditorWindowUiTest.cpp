@@ -78,7 +78,8 @@ protected:
         CUnitUtil::ResetUserUnits();
     }
 
-    // A copy of the example in the test's folder, so that saving never touches the original.
+    // A copy of the example in the test's folder, so that saving never touches the original;
+    // the data files it names go beside it, as they lie beside the original.
     QString CopyOfExample(const QString& name = "estuary.setup") {
         const QString path = m_dir.filePath(name);
         EXPECT_TRUE(WriteAll(path, ReadAll(kExample)));
