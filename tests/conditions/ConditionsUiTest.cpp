@@ -46,8 +46,8 @@ TEST_F(DialogTest, ConcentrationAndThicknessGridsShowFormatsAndLinkToTheirItems)
     ASSERT_NE(grid, nullptr);
     EXPECT_EQ(Headings(grid), (std::vector<std::string>{"Fraction", "Format", "Edit"}));
     EXPECT_EQ(Column(grid, 0), (std::vector<std::string>{"Fraction 1", "Fraction 2", "Fraction 3"}));
-    EXPECT_EQ(Column(grid, 1), (std::vector<std::string>{"Constant", "Varying in domain: ssc.qrd1",
-                                                         "Constant"}));
+    EXPECT_EQ(Column(grid, 1), (std::vector<std::string>{"Constant 0 kg/m^3", "Varying in domain: ssc.qrd1",
+                                                         "Constant 0 kg/m^3"}));
     EXPECT_TRUE(grid->CellStyle(1, 1).readOnly);
     EXPECT_EQ(grid->CellStyle(1, 1).align, ZoCellAlign::Center);
     ClickCell(grid, 3, 2);

@@ -302,7 +302,7 @@ TEST_F(DredgerPage, TheProjectionIsChosenFromTheRegistry) {
     EXPECT_EQ(dredger->CoordinateType(), "LONG/LAT");
     EXPECT_TRUE(host.hints.empty());
     ASSERT_EQ(messages.Messages().size(), 1u);
-    EXPECT_EQ(messages.Messages()[0], "\"Mercator?\" is not a known projection.");
+    EXPECT_EQ(messages.Messages()[0], "Dredger 1: \"Mercator?\" is not a known projection.");
     EXPECT_EQ(box->currentText(), "LONG/LAT");
     EXPECT_EQ(box->findText("Mercator?"), -1);
 }

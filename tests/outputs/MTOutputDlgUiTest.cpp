@@ -386,7 +386,7 @@ TEST(MTOutputItemMainDlg, ImportFromFile) {
     FileChooserStub chooser(bad);
     Child<QPushButton>(page, "importFromFile")->click();
     ASSERT_EQ(messages.Messages().size(), 1u);
-    EXPECT_TRUE(messages.Messages()[0].startsWith(
+    EXPECT_TRUE(messages.Messages()[0].contains(
         "Illegal import file:\nFormat is \"x y z name\", where name is optional."));
     EXPECT_TRUE(messages.Messages()[0].contains("bad.xyz"));
     EXPECT_EQ(points->Points().size(), 4u);

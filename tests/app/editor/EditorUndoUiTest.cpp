@@ -19,6 +19,7 @@
 
 #include <QApplication>
 #include <QComboBox>
+#include <QDir>
 #include <QFile>
 #include <QFormLayout>
 #include <QGroupBox>
@@ -72,6 +73,12 @@ protected:
         m_path = m_dir.filePath("estuary.setup");
         QFile::remove(m_path);
         ASSERT_TRUE(QFile::copy(kExample, m_path));
+        // The mesh and data files the example names go with it, so that it validates.
+        const QDir examples(QStringLiteral(MUD_SOURCE_DIR "/examples"));
+        QFile::copy(examples.filePath("estuary.2dm"), m_dir.filePath("estuary.2dm"));
+        QDir(m_dir.path()).mkpath("data");
+        for (const QString& f : QDir(examples.filePath("data")).entryList(QDir::Files))
+            QFile::copy(examples.filePath("data/" + f), m_dir.filePath("data/" + f));
         ASSERT_TRUE(m_window->OpenFile(m_path));
     }
     void TearDown() override {

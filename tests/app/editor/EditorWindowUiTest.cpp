@@ -395,6 +395,7 @@ TEST_F(EditorTest, WarningsFromReadingAreListed) {
 }
 
 TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
+    CopyOfExample();  // brings the mesh and data files beside it
     QByteArray text = ReadAll(kExample);
     text.replace("MUD_TRANSPORT_MODULE {\n", "MUD_TRANSPORT_MODULE {\n    PARTICLE_TRACKING {\n    }\n");
     const QString path = m_dir.filePath("newer.setup");

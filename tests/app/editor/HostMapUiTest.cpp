@@ -158,7 +158,7 @@ TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {
     type("MERCATOR");
     EXPECT_EQ(domain->Projection(), "EPSG:25832");
     ASSERT_EQ(messages.size(), 1);
-    EXPECT_EQ(messages[0], "\"MERCATOR\" is not a known projection.");
+    EXPECT_EQ(messages[0], "Domain: \"MERCATOR\" is not a known projection.");
     combo->setCurrentIndex(combo->findText("UTM-33"));
     emit combo->activated(combo->currentIndex());
     EXPECT_EQ(domain->Projection(), "UTM-33");
