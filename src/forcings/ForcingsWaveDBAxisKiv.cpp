@@ -7,19 +7,19 @@
 namespace {
 constexpr unsigned kMsgValuesOutOfRange = 4127;
 
-const CForcingsWaveDBAxisKiv::Spec kWindSpeed = {
+const CForcingsWaveDBAxisKiv::Layout kWindSpeed = {
     "Waves Database Wind Speed", "WIND_SPEED", "starting_value_of_wind_speed",
     "increment_value_of_wind_speed", "number_of_wind_speeds", 5.0, 5.0, 1, false, false};
-const CForcingsWaveDBAxisKiv::Spec kWindDirection = {
+const CForcingsWaveDBAxisKiv::Layout kWindDirection = {
     "Waves Database Wind Direction", "WIND_DIRECTION", "starting_value_of_wind_direction",
     "increment_value_of_wind_direction", "number_of_wind_directions", 90.0, 90.0, 1, false, true};
-const CForcingsWaveDBAxisKiv::Spec kWaterLevel = {
+const CForcingsWaveDBAxisKiv::Layout kWaterLevel = {
     "Waves Database Water Level", "WATER_LEVEL", "starting_value_of_water_level",
     "increment_value_of_water_level", "number_of_water_levels", 0.0, 1.0, 1, true, true};
 }  // namespace
 
-CForcingsWaveDBAxisKiv::CForcingsWaveDBAxisKiv(const Spec& spec, CZoSEKivBase* parent)
-    : CZoSEKivBase(spec.title, spec.section, parent), m_spec(spec) {
+CForcingsWaveDBAxisKiv::CForcingsWaveDBAxisKiv(const Layout& layout, CZoSEKivBase* parent)
+    : CZoSEKivBase(layout.title, layout.section, parent), m_layout(layout) {
     SetDefault();
 }
 
@@ -35,9 +35,9 @@ bool CForcingsWaveDBAxisKiv::IsValid() const {
     // Not-a-number and infinite values fail every test.
     if (!std::isfinite(m_start) || !std::isfinite(m_increment) || m_count < 0)
         return false;
-    if (!m_spec.startMayBeNegative && m_start < 0.0)
+    if (!m_layout.startMayBeNegative && m_start < 0.0)
         return false;
-    return m_spec.incrementMayBeZero ? m_increment >= 0.0 : m_increment > 0.0;
+    return m_layout.incrementMayBeZero ? m_increment >= 0.0 : m_increment > 0.0;
 }
 
 // The keywords are the axis's own, so the table is made for it.
@@ -48,9 +48,9 @@ struct CForcingsWaveDBAxisKiv::FieldTable {
 CForcingsWaveDBAxisKiv::FieldTable CForcingsWaveDBAxisKiv::Fields() const {
     using F = KivField<CForcingsWaveDBAxisKiv>;
     using K = CForcingsWaveDBAxisKiv;
-    return {{F::DoubleAsFloat(m_spec.startKeyword, &K::m_start, m_spec.start),
-             F::DoubleAsFloat(m_spec.incrementKeyword, &K::m_increment, m_spec.increment),
-             F::Int(m_spec.countKeyword, &K::m_count, m_spec.count)}};
+    return {{F::DoubleAsFloat(m_layout.startKeyword, &K::m_start, m_layout.start),
+             F::DoubleAsFloat(m_layout.incrementKeyword, &K::m_increment, m_layout.increment),
+             F::Int(m_layout.countKeyword, &K::m_count, m_layout.count)}};
 }
 
 void CForcingsWaveDBAxisKiv::WriteData(void* h) { WriteFields(h, *this, Fields().fields); }

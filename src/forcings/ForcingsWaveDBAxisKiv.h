@@ -6,7 +6,7 @@
 // The three axes differ in their names, defaults and what they accept.
 class CForcingsWaveDBAxisKiv : public CZoSEKivBase {
 public:
-    struct Spec {
+    struct Layout {
         const char* title;
         const char* section;
         const char* startKeyword;
@@ -19,7 +19,7 @@ public:
         bool incrementMayBeZero;
     };
 
-    CForcingsWaveDBAxisKiv(const Spec& spec, CZoSEKivBase* parent);
+    CForcingsWaveDBAxisKiv(const Layout& layout, CZoSEKivBase* parent);
 
     double Start() const { return m_start; }
     void Start(double v) { m_start = v; }
@@ -47,7 +47,7 @@ private:
     struct FieldTable;
     FieldTable Fields() const;
 
-    const Spec& m_spec;
+    const Layout& m_layout;
     double m_start = 0.0;
     double m_increment = 0.0;
     int m_count = 0;

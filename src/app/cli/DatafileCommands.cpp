@@ -111,18 +111,18 @@ int Fail(const std::string& message) {
     return kExitError;
 }
 
-std::optional<datafile::Item> ParseItem(const std::string& spec, std::string& error) {
+std::optional<datafile::Item> ParseItem(const std::string& arg, std::string& error) {
     std::vector<std::string> parts;
     std::size_t pos = 0;
     for (;;) {
-        const std::size_t colon = spec.find(':', pos);
-        parts.push_back(spec.substr(pos, colon == std::string::npos ? std::string::npos : colon - pos));
+        const std::size_t colon = arg.find(':', pos);
+        parts.push_back(arg.substr(pos, colon == std::string::npos ? std::string::npos : colon - pos));
         if (colon == std::string::npos)
             break;
         pos = colon + 1;
     }
     if (parts.size() < 2 || parts.size() > 3 || parts[0].empty()) {
-        error = "--item " + spec + ": expected NAME:UNITTYPE or NAME:UNITTYPE:UNIT";
+        error = "--item " + arg + ": expected NAME:UNITTYPE or NAME:UNITTYPE:UNIT";
         return std::nullopt;
     }
     const QuantityInfo* q = nullptr;
@@ -135,7 +135,7 @@ std::optional<datafile::Item> ParseItem(const std::string& spec, std::string& er
             if (EqualsNoCase(info.name, parts[1]))
                 q = &info;
     if (!q) {
-        error = "--item " + spec + ": unknown unit type \"" + parts[1] + "\"";
+        error = "--item " + arg + ": unknown unit type \"" + parts[1] + "\"";
         return std::nullopt;
     }
     datafile::Item item{parts[0], q->code, q->units.front().name};
@@ -146,7 +146,7 @@ std::optional<datafile::Item> ParseItem(const std::string& spec, std::string& er
             std::string known;
             for (const UnitInfo& ui : q->units)
                 known += (known.empty() ? "" : ", ") + std::string(ui.name);
-            error = "--item " + spec + ": \"" + parts[2] + "\" is not a unit of " + q->name + " (" +
+            error = "--item " + arg + ": \"" + parts[2] + "\" is not a unit of " + q->name + " (" +
                     known + ")";
             return std::nullopt;
         }
@@ -252,9 +252,9 @@ int New(const NewOptions& o) {
     h.title = o.title;
     if (o.items.empty())
         return Fail("at least one --item NAME:UNITTYPE is needed");
-    for (const std::string& spec : o.items) {
+    for (const std::string& arg : o.items) {
         std::string error;
-        const auto item = ParseItem(spec, error);
+        const auto item = ParseItem(arg, error);
         if (!item)
             return Fail(error);
         h.items.push_back(*item);
