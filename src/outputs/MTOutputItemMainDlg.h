@@ -1,4 +1,4 @@
-// The output specification: kind, format, result file, flood and dry, time steps, map
+// The "Output specification" page: kind, format, result file, flood and dry, time steps, map
 // projection, interpolation, the line's number of points, the layer range and the
 // coordinates of the geometry, with an import of points from an xyz file.
 #pragma once

@@ -1,4 +1,4 @@
-// The pages of one output: its map, its specification and the quantities of its kind.
+// The pages of one output: its map, its "Output specification" and the quantities of its kind.
 #pragma once
 
 #include "widgets/FemPropertySheetDlg.h"
@@ -10,7 +10,7 @@ public:
     void Initialize() override;
     void SetData() override;
 
-    // The page open in every output's sheet (0 map, 1 specification, 2 quantities).
+    // The page open in every output's sheet (0 map, 1 "Output specification", 2 quantities).
     static int& ActivePage();
 
 private:

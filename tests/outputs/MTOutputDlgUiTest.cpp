@@ -75,7 +75,7 @@ struct ScratchDir {
     }
 };
 
-// The specification page of an output inside its sheet.
+// The "Output specification" page of an output inside its sheet.
 CMTOutputItemMainDlg* SpecificationPage(CZoSEDlgBase* sheet) {
     auto* s = dynamic_cast<CMTOutputItemPropertySheet*>(sheet);
     EXPECT_NE(s, nullptr);
@@ -208,7 +208,7 @@ TEST(MTOutputItemPropertySheet, PagesFollowTheTypeAndTheOpenPageIsKept) {
     CMTOutputItemPropertySheet::ActivePage() = 0;
 }
 
-// --- the specification --------------------------------------------------------------------
+// --- "Output specification" -----------------------------------------------------------------
 
 TEST(MTOutputItemMainDlg, EntriesAndEnablingFollowTypeAndFormat) {
     auto doc = WithOutputs(true, true, 1);
