@@ -8,8 +8,8 @@
 //   NS n1 n2 ... -nk [code] [name]  an open boundary: a node string over one or more NS
 //                                   lines, its last node negative, then optionally the
 //                                   boundary's code and name
-// Other cards (MESHNAME, NUM_MATERIALS_PER_ELEM, BEGPARAMDEF ... ENDPARAMDEF, ...) are
-// passed over with a note.
+// MESHNAME and NUM_MATERIALS_PER_ELEM are passed over; other cards (MAT, BEGPARAMDEF ...
+// ENDPARAMDEF, ...) with a note.
 #include "MeshReader.h"
 
 #include <algorithm>
@@ -187,7 +187,8 @@ struct Parser {
                 blockEnd = {};
             return std::nullopt;
         }
-        if (card == "MESH2D")
+        // Cards that only describe the file.
+        if (card == "MESH2D" || card == "MESHNAME" || card == "NUM_MATERIALS_PER_ELEM")
             return std::nullopt;
         if (card == "BEGPARAMDEF")
             blockEnd = "ENDPARAMDEF";
@@ -379,7 +380,8 @@ struct Parser {
             for (int i = 0; i < CMesh::Corners(e); ++i)
                 corner[static_cast<size_t>(e[i])] = 1;
         for (const auto& m : midIds)
-            mid[static_cast<size_t>(nodes.Find(m.first))] = 1;
+            if (const int i = nodes.Find(m.first); i >= 0)
+                mid[static_cast<size_t>(i)] = 1;
         std::vector<int> to(n, -1);
         size_t kept = 0;
         for (size_t i = 0; i < n; ++i)

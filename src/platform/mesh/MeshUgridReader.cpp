@@ -213,7 +213,7 @@ Topology FindTopology(const File& f, std::vector<std::string>& notes) {
         if (f.TextAtt(v, "cf_role") == "mesh_topology") {
             double dim = 2;
             f.NumberAtt(v, "topology_dimension", dim);
-            all.push_back({v, std::llround(dim)});
+            all.push_back({v, std::isfinite(dim) && std::fabs(dim) < 1e9 ? std::llround(dim) : 0});
         }
     if (all.empty())
         throw Fail{"no variable with cf_role = \"mesh_topology\" (not a UGRID mesh)"};
@@ -262,7 +262,7 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
     if (columns != 2 && width > kMaxFaceColumns)
         throw Fail{what + ": faces of up to " + std::to_string(width) +
                    " nodes: the flow model takes triangles and quadrilaterals"};
-    if (rows > kMaxCount)
+    if (rows > kMaxCount || rows * width > 4 * kMaxCount)
         throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
     // Read as doubles: any integer type, and floating tables with NaN as fill, alike.
     std::vector<double> raw(rows * width);
@@ -473,7 +473,9 @@ void ReadBedLevel(const File& f, const Topology& topo, int nodeDim, CMesh& mesh)
     bool down = false;
     for (int v = 0; v < f.VarCount(); ++v) {
         const std::vector<int> dims = f.Dims(v);
-        if (dims.size() != 1 || dims[0] != nodeDim)
+        const nc_type type = f.Type(v);
+        if (dims.size() != 1 || dims[0] != nodeDim || type == NC_CHAR || type < NC_BYTE ||
+            type > NC_UINT64)
             continue;
         const std::string mesh_ = f.TextAtt(v, "mesh"), location = f.TextAtt(v, "location");
         if (!mesh_.empty() && mesh_ != topo.name)

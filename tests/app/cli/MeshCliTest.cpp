@@ -91,11 +91,11 @@ TEST(MeshCli, InfoSaysWhereTheBedLevelIsMissingAndWhatWasPassedOver) {
 
     const fs::path text = fs::temp_directory_path() / "mudsetup-lines.2dm";
     std::ofstream(text) << "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3 1\n"
-                           "E2L 2 1 2 1\nMESHNAME \"x\"\n";
+                           "E2L 2 1 2 1\nMAT 1 \"mud\"\n";
     r = Mudsetup("mesh info " + text.string());
     EXPECT_EQ(r.exitCode, 0) << r.err;
     EXPECT_NE(r.out.find("notes:\n  1 line element (E2L, E3L) passed over\n"
-                         "  cards of other tools passed over: MESHNAME\n"),
+                         "  cards of other tools passed over: MAT\n"),
               std::string::npos)
         << r.out;
     fs::remove(text);
