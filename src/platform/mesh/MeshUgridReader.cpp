@@ -15,6 +15,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cmath>
+#include <cstdlib>
 #include <iomanip>
 #include <map>
 #include <new>
@@ -555,7 +556,7 @@ std::string ProjectionOf(const File& f, int crs, std::vector<std::string>& notes
             code = code.substr(5);
         if (code.empty())
             continue;
-        const long long epsg = std::atoll(code.c_str());
+        const long long epsg = std::strtoll(code.c_str(), nullptr, 10);
         const std::string p = epsg > 0 && epsg < INT32_MAX
                                   ? CZoMapProjection::FromEpsg(static_cast<int>(epsg))
                                   : std::string();
