@@ -12,8 +12,9 @@ namespace testsupport {
 
 class PrivateTempDir {
 public:
-    // Points TMPDIR (read by std::filesystem and Qt alike) and the settings folder into a
-    // new folder under the one given, which is removed again when the tests end.
+    // Points TMPDIR (read by std::filesystem and Qt alike), the settings folder and Qt's
+    // runtime folder into a new folder under the one given (mode 0700, as the runtime folder
+    // must be), which is removed again when the tests end.
     PrivateTempDir() {
         const char* base = std::getenv("TMPDIR");
         std::string pattern = std::string(base && *base ? base : "/tmp") + "/mudtests-XXXXXX";
@@ -24,6 +25,7 @@ public:
         m_path = pattern;
         setenv("TMPDIR", m_path.c_str(), 1);
         setenv("XDG_CONFIG_HOME", (m_path + "/config").c_str(), 1);
+        setenv("XDG_RUNTIME_DIR", m_path.c_str(), 1);
     }
     ~PrivateTempDir() {
         std::error_code ignored;

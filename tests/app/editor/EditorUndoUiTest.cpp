@@ -279,8 +279,8 @@ TEST_F(EditorUndoTest, TheWheelOverAFieldScrollsTheForm) {
         scroll = qobject_cast<QScrollArea*>(w);
     ASSERT_TRUE(scroll);
     // The layout settles over a few event rounds, later on a busy machine.
-    QTest::qWaitFor([&] { return scroll->verticalScrollBar()->maximum() > 0; }, 5000);
-    ASSERT_GT(scroll->verticalScrollBar()->maximum(), 0) << "the form fits; the window is too tall for the test";
+    ASSERT_TRUE(QTest::qWaitFor([&] { return scroll->verticalScrollBar()->maximum() > 0; }, 5000))
+        << "the form fits; the window is too tall for the test";
     QComboBox* format = Form()->findChild<QComboBox*>();
     ASSERT_TRUE(format);
     const int before = scroll->verticalScrollBar()->value();
