@@ -46,8 +46,8 @@ int Info(const std::string& file) {
     else
         std::cout << "z: " << Number(e.zMin) << " to " << Number(e.zMax) << "\n";
     if (m.HasBedLevel() && m.MissingBedLevelCount())
-        std::cout << "bed level: missing on " << m.MissingBedLevelCount() << " of "
-                  << m.NodeCount() << " nodes\n";
+        std::cout << "bed level: missing on " << m.MissingBedLevelCount() << " of " << m.NodeCount()
+                  << " nodes\n";
     std::cout << "projection: "
               << (m.projection.empty() ? std::string("(not stated)") : m.projection) << "\n"
               << "open boundaries: " << m.boundaries.size() << "\n";

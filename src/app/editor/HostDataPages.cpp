@@ -362,7 +362,8 @@ public:
         if (m)
             for (const std::string& note : m->notes)
                 notes << QStringLiteral("\u2022 ") + Q(note);
-        m_notes->setText(notes.isEmpty() ? QString() : tr("Read with notes:\n%1").arg(notes.join('\n')));
+        m_notes->setText(notes.isEmpty() ? QString()
+                                         : tr("Read with notes:\n%1").arg(notes.join('\n')));
         m_notes->setVisible(!notes.isEmpty());
     }
 

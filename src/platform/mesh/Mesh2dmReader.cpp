@@ -74,7 +74,11 @@ bool IsUtf8(std::string_view s) {
     const auto* e = p + s.size();
     while (p < e) {
         const unsigned c = *p;
-        const int n = c < 0x80 ? 0 : (c >> 5) == 6 ? 1 : (c >> 4) == 14 ? 2 : (c >> 3) == 30 ? 3 : -1;
+        const int n = c < 0x80         ? 0
+                      : (c >> 5) == 6  ? 1
+                      : (c >> 4) == 14 ? 2
+                      : (c >> 3) == 30 ? 3
+                                       : -1;
         if (n < 0 || (n == 1 && c < 0xc2) || (n == 3 && c > 0xf4) || e - p <= n)
             return false;
         for (int i = 1; i <= n; ++i)
@@ -153,7 +157,7 @@ struct Parser {
     size_t quadratic = 0, lineElements = 0;
     std::vector<PendingString> strings;
     bool inString = false;
-    std::string_view blockEnd;         // the card that ends the block being passed over
+    std::string_view blockEnd; // the card that ends the block being passed over
     std::set<std::string, std::less<>> passedOver;
     NodeIds nodes;
 
@@ -327,12 +331,13 @@ struct Parser {
             }
         for (const auto& [id, line] : midIds)
             if (nodes.Find(id) < 0)
-                return Error{line, "element names node " + std::to_string(id) +
-                                       ", which does not exist"};
+                return Error{line,
+                             "element names node " + std::to_string(id) + ", which does not exist"};
         std::unordered_set<int> codes;
         for (const PendingString& ns : strings)
             if (ns.hasCode && !codes.insert(ns.code).second)
-                return Error{ns.line, "boundary code " + std::to_string(ns.code) + " is used twice"};
+                return Error{ns.line,
+                             "boundary code " + std::to_string(ns.code) + " is used twice"};
         // Strings without a code are numbered in file order, past the codes that are taken.
         int next = 2;
         for (size_t s = 0; s < strings.size(); ++s) {
@@ -407,9 +412,8 @@ struct Parser {
             if (few(b))
                 mesh.notes.push_back("boundary \"" + b.name +
                                      "\" passed over: it has no two corner nodes");
-        mesh.boundaries.erase(
-            std::remove_if(mesh.boundaries.begin(), mesh.boundaries.end(), few),
-            mesh.boundaries.end());
+        mesh.boundaries.erase(std::remove_if(mesh.boundaries.begin(), mesh.boundaries.end(), few),
+                              mesh.boundaries.end());
         mesh.notes.push_back(
             Count(quadratic, "quadratic element", "quadratic elements") +
             " (E6T, E8Q, E9Q) read by their corner nodes; the mid-side nodes are not used (" +

@@ -153,16 +153,26 @@ void Check(int status, const std::string& what) {
 
 double DefaultFill(nc_type t) {
     switch (t) {
-    case NC_BYTE: return NC_FILL_BYTE;
-    case NC_UBYTE: return NC_FILL_UBYTE;
-    case NC_SHORT: return NC_FILL_SHORT;
-    case NC_USHORT: return NC_FILL_USHORT;
-    case NC_INT: return NC_FILL_INT;
-    case NC_UINT: return NC_FILL_UINT;
-    case NC_INT64: return static_cast<double>(NC_FILL_INT64);
-    case NC_UINT64: return static_cast<double>(NC_FILL_UINT64);
-    case NC_FLOAT: return NC_FILL_FLOAT;
-    default: return NC_FILL_DOUBLE;
+    case NC_BYTE:
+        return NC_FILL_BYTE;
+    case NC_UBYTE:
+        return NC_FILL_UBYTE;
+    case NC_SHORT:
+        return NC_FILL_SHORT;
+    case NC_USHORT:
+        return NC_FILL_USHORT;
+    case NC_INT:
+        return NC_FILL_INT;
+    case NC_UINT:
+        return NC_FILL_UINT;
+    case NC_INT64:
+        return static_cast<double>(NC_FILL_INT64);
+    case NC_UINT64:
+        return static_cast<double>(NC_FILL_UINT64);
+    case NC_FLOAT:
+        return NC_FILL_FLOAT;
+    default:
+        return NC_FILL_DOUBLE;
     }
 }
 
@@ -221,7 +231,7 @@ Topology FindTopology(const File& f, std::vector<std::string>& notes) {
     Topology t;
     for (const auto& [v, dim] : all)
         if (dim == 2 && (t.var < 0 || (!f.HasAtt(t.var, "face_node_connectivity") &&
-                                        f.HasAtt(v, "face_node_connectivity"))))
+                                       f.HasAtt(v, "face_node_connectivity"))))
             t = {v, f.Name(v)};
     std::string others;
     for (const auto& [v, dim] : all)
@@ -286,8 +296,8 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
             const double index = v - start;
             if (v != std::floor(v) || index < 0 || index >= static_cast<double>(nodes)) {
                 std::ostringstream text;
-                text << std::setprecision(17) << what << ": " << row << " " << r + 1 << " names node " << v
-                     << ", which does not exist (nodes " << start << " to "
+                text << std::setprecision(17) << what << ": " << row << " " << r + 1
+                     << " names node " << v << ", which does not exist (nodes " << start << " to "
                      << start + static_cast<double>(nodes) - 1 << ")";
                 throw Fail{text.str()};
             }
@@ -362,7 +372,8 @@ void ReadBoundaries(const File& f, const Topology& topo, CMesh& mesh) {
             codesVar = v;
     // Without codes the edges cannot be told apart from the land boundary.
     if (codesVar < 0) {
-        mesh.notes.push_back(connName + " passed over: no boundary variable gives the edges' codes");
+        mesh.notes.push_back(connName +
+                             " passed over: no boundary variable gives the edges' codes");
         return;
     }
     const std::vector<size_t> shape = f.Shape(codesVar);
@@ -463,9 +474,9 @@ std::pair<std::string, std::string> NodeCoordinates(const File& f, const Topolog
 // The bed level: a node variable of the mesh by standard_name, else by the names tools use;
 // depths are turned into levels. Fill values are missing levels.
 void ReadBedLevel(const File& f, const Topology& topo, int nodeDim, CMesh& mesh) {
-    static const char* const kUp[] = {"altitude", "height_above_mean_sea_level",
+    static const char* const kUp[] = {"altitude",           "height_above_mean_sea_level",
                                       "height_above_geoid", "height_above_reference_ellipsoid",
-                                      "surface_altitude", "bed_altitude"};
+                                      "surface_altitude",   "bed_altitude"};
     static const char* const kNamesUp[] = {"mesh2d_node_z", "netnode_z", "node_z", "elevation",
                                            "bed_level"};
     static const char* const kNamesDown[] = {"depth", "bathymetry", "bottom_depth"};
@@ -493,8 +504,7 @@ void ReadBedLevel(const File& f, const Topology& topo, int nodeDim, CMesh& mesh)
             rank = 0, isDepth = true;
         else if (!sn.empty())
             continue; // a quantity of its own
-        else if (std::find(std::begin(kNamesUp), std::end(kNamesUp), name) !=
-                     std::end(kNamesUp) ||
+        else if (std::find(std::begin(kNamesUp), std::end(kNamesUp), name) != std::end(kNamesUp) ||
                  name == Lower(topo.name) + "_node_z")
             rank = 1;
         else if (std::find(std::begin(kNamesDown), std::end(kNamesDown), name) !=

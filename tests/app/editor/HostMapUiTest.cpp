@@ -155,7 +155,8 @@ TEST_F(HostMaps, NotesOnReadingTheMeshAreShownOnTheDomainPageAndInTheMessages) {
     emit file->editingFinished();
     ASSERT_EQ(m_window->Document().GetDomain()->MeshFile(), "lines.2dm");
     EXPECT_FALSE(notes->isHidden());
-    EXPECT_TRUE(notes->text().contains("1 line element (E2L, E3L) passed over")) << notes->text().toStdString();
+    EXPECT_TRUE(notes->text().contains("1 line element (E2L, E3L) passed over"))
+        << notes->text().toStdString();
 
     m_window->Validate();
     EXPECT_TRUE(m_window->MessagesText(false).contains(

@@ -85,26 +85,43 @@ TEST(Mesh2dm, FilesOfOtherTools) {
          "MESH2D\nND 1 0 0 -1\nND 2 1 0 -1\nND 3 1 1 -1\nND 4 0 1 -1\nND 5 2 0 -1\n"
          "E4Q 1 1 2 3 4 1\nNS 1 2 -5 inflow_boundary\nNS 3 4 -1 \"one two\"\nNS 5 -3 7 Sea\n"
          "NS 2 -3\n",
-         5, 0, 1,
-         {{"inflow_boundary", 2, {0, 1, 4}}, {"one two", 3, {2, 3, 0}}, {"Sea", 7, {4, 2}},
+         5,
+         0,
+         1,
+         {{"inflow_boundary", 2, {0, 1, 4}},
+          {"one two", 3, {2, 3, 0}},
+          {"Sea", 7, {4, 2}},
           {"Boundary 4", 5, {1, 2}}},
          {},
          {0, 1, 2, 3}},
         {"ids from 0 with gaps, out of order, elements first",
          "E3T 0 0 7 3\nE3T 9 3 7 12 1\nND 12 1 1 0\nND 0 0 0 0\nND 7 1 0 0\nND 3 0 1 0\n"
          "NS 12 -0\n",
-         4, 2, 0, {{"Boundary 1", 2, {0, 1}}}, {}, {1, 2, 3, -1}},
+         4,
+         2,
+         0,
+         {{"Boundary 1", 2, {0, 1}}},
+         {},
+         {1, 2, 3, -1}},
         {"line elements beside faces",
          "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE2L 1 1 2 1\nE3T 2 1 2 3 1\n"
          "E3L 3 1 2 3 1\n",
-         3, 1, 0, {}, {"2 line elements (E2L, E3L) passed over"}, {0, 1, 2, -1}},
+         3,
+         1,
+         0,
+         {},
+         {"2 line elements (E2L, E3L) passed over"},
+         {0, 1, 2, -1}},
         {"quadratic elements by their corners",
          // A 6-node triangle and a 9-node quadrilateral sharing the edge 3-4-5; node 20 is in
          // no element and stays.
          "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 2 0 -1\nND 4 1 1 0\nND 5 0 2 0\nND 6 0 1 0\n"
          "ND 7 4 0 0\nND 8 4 2 0\nND 9 3 0 0\nND 10 4 1 0\nND 11 2 2 0\nND 12 3 1 0\n"
          "ND 20 9 9 -3\nE6T 1 1 2 3 4 5 6 1\nE9Q 2 3 9 7 10 8 11 5 4 12 1\nNS 1 2 3 9 -7\n",
-         6, 1, 1, {{"Boundary 1", 2, {0, 1, 3}}},
+         6,
+         1,
+         1,
+         {{"Boundary 1", 2, {0, 1, 3}}},
          {"2 quadratic elements (E6T, E8Q, E9Q) read by their corner nodes; the mid-side nodes "
           "are not used (7 nodes left out)"},
          {0, 1, 2, -1}},
@@ -113,7 +130,10 @@ TEST(Mesh2dm, FilesOfOtherTools) {
          "ND 9 9 9 9\r\nENDPARAMDEF\r\nND 1 0 0 -2 0 0\r\nND 2 1 0 -1\r\nND 3 0 1 -3\r\n"
          "E3T 1 1 2 3 1 4 5\r\nNS 1 -2 2 R\xe9gion\r\nBEGCURVE 1\r\n0 1\r\nENDCURVE\r\n"
          "MAT 1 \"mud\"\r\nBEG2DMBC\r\nBC_DEF 1\r\nGP_DEF 1\r\nMAT_DEF 1\r\nEND2DMBC\r\n",
-         4, 1, 0, {{"R\xe9gion", 2, {1, 2}}},
+         4,
+         1,
+         0,
+         {{"R\xe9gion", 2, {1, 2}}},
          {"line 12: the boundary name is not valid UTF-8; kept byte for byte",
           "cards of other tools passed over: BEG2DMBC, BEGCURVE, BEGPARAMDEF, MAT"},
          {1, 2, 3, -1}},
@@ -244,7 +264,8 @@ const char* const kUtm32Wkt =
 // mesh must come out, with the bed level, projection and notes that the file states.
 TEST(MeshUgrid, FilesOfOtherTools) {
     using testsupport::UgridSpec;
-    const std::string yFirst = "node_coordinates lists y first: x is Mesh2_node_x, y is Mesh2_node_y";
+    const std::string yFirst =
+        "node_coordinates lists y first: x is Mesh2_node_x, y is Mesh2_node_y";
     const std::string oneMissing = "bed level missing on 1 of 6 nodes (fill values in Mesh2_depth)";
     struct Case {
         const char* name;
@@ -259,7 +280,8 @@ TEST(MeshUgrid, FilesOfOtherTools) {
         {"64-bit offset", [](UgridSpec& s) { s.format = NC_64BIT_OFFSET; }},
         {"netCDF-4, int64 table",
          [](UgridSpec& s) { s.format = NC_NETCDF4, s.faceType = NC_INT64; }},
-        {"netCDF-4, uint32 table", [](UgridSpec& s) { s.format = NC_NETCDF4, s.faceType = NC_UINT; }},
+        {"netCDF-4, uint32 table",
+         [](UgridSpec& s) { s.format = NC_NETCDF4, s.faceType = NC_UINT; }},
         {"double table with NaN as fill", [](UgridSpec& s) { s.faceType = NC_DOUBLE; }},
         {"start_index as a float", [](UgridSpec& s) { s.startIndexAsFloat = true; }},
         {"no declared fill, -1 for none", [](UgridSpec& s) { s.faceFillAttribute = false; }},
@@ -271,28 +293,53 @@ TEST(MeshUgrid, FilesOfOtherTools) {
              s.yFirst = true, s.epsg = 0;
              s.xStandardName = "longitude", s.yStandardName = "latitude";
          },
-         -5, 1.5, 0, "LONG/LAT", {yFirst}},
+         -5,
+         1.5,
+         0,
+         "LONG/LAT",
+         {yFirst}},
         {"units tell x from y",
          [](UgridSpec& s) {
              s.yFirst = true, s.epsg = 0;
              s.xUnits = "degrees_east", s.yUnits = "degree_N";
          },
-         -5, 1.5, 0, "LONG/LAT", {yFirst}},
+         -5,
+         1.5,
+         0,
+         "LONG/LAT",
+         {yFirst}},
         {"projected, y first",
          [](UgridSpec& s) {
              s.yFirst = true;
-             s.xStandardName = "projection_x_coordinate", s.yStandardName = "projection_y_coordinate";
+             s.xStandardName = "projection_x_coordinate",
+             s.yStandardName = "projection_y_coordinate";
          },
-         -5, 1.5, 0, "UTM-32", {yFirst}},
+         -5,
+         1.5,
+         0,
+         "UTM-32",
+         {yFirst}},
         {"bed level _FillValue",
          [](UgridSpec& s) { s.depth[3] = -999, s.depthFill = true; },
-         -5, -1, 1, "UTM-32", {oneMissing}},
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
         {"bed level missing_value",
          [](UgridSpec& s) { s.depth[3] = -999, s.depthMissing = true; },
-         -5, -1, 1, "UTM-32", {oneMissing}},
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
         {"bed level the float default fill",
          [](UgridSpec& s) { s.depth[3] = NC_FILL_FLOAT, s.depthType = NC_FLOAT; },
-         -5, -1, 1, "UTM-32", {oneMissing}},
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
         {"bed level by name, a level",
          [](UgridSpec& s) {
              s.depthName = "mesh2d_node_z", s.depthStandardName = "", s.depthOfMesh = false;
@@ -307,7 +354,10 @@ TEST(MeshUgrid, FilesOfOtherTools) {
          -1.5, 5},
         {"no bed level",
          [](UgridSpec& s) { s.depth.clear(); },
-         0, 0, 6, "UTM-32",
+         0,
+         0,
+         6,
+         "UTM-32",
          {"bed level: none found (no node variable of the mesh is a bed level or a depth)"}},
         {"grid_mapping on a data variable, EPSG_code",
          [](UgridSpec& s) {
@@ -319,11 +369,18 @@ TEST(MeshUgrid, FilesOfOtherTools) {
          [](UgridSpec& s) { s.crsAttribute = "crs_wkt", s.crsText = kUtm32Wkt; }},
         {"an unknown EPSG code",
          [](UgridSpec& s) { s.epsg = 999999; },
-         -5, 1.5, 0, "",
+         -5,
+         1.5,
+         0,
+         "",
          {"projection crs:epsg_code = \"999999\" is not a known EPSG code; none taken"}},
         {"a 1D topology beside the 2D one",
          [](UgridSpec& s) { s.network1d = true; },
-         -5, 1.5, 0, "UTM-32", {"2D topology Mesh2 taken; passed over: network (1D)"}},
+         -5,
+         1.5,
+         0,
+         "UTM-32",
+         {"2D topology Mesh2 taken; passed over: network (1D)"}},
     };
     const std::string path = Temp("other.nc");
     for (const Case& c : cases) {

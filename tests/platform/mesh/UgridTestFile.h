@@ -23,7 +23,7 @@ struct UgridSpec {
     int epsg = 0;
     bool topology = true;
 
-    int format = 0;                  // 0 classic, NC_64BIT_OFFSET or NC_NETCDF4
+    int format = 0; // 0 classic, NC_64BIT_OFFSET or NC_NETCDF4
     // The face table: its type (NC_INT, NC_INT64, NC_UINT, NC_DOUBLE with NaN as fill), the
     // older (nodes, faces) layout, and whether face_dimension says so.
     nc_type faceType = NC_INT;
@@ -31,8 +31,8 @@ struct UgridSpec {
     bool faceDimensionAttribute = false;
     bool startIndexAsFloat = false;
     bool faceFillAttribute = true;
-    bool hasFaces = true;            // the topology names a face table
-    bool network1d = false;          // a 1D topology written first
+    bool hasFaces = true;   // the topology names a face table
+    bool network1d = false; // a 1D topology written first
     // Coordinates: which node_coordinates lists first, and what they say they are.
     bool yFirst = false;
     std::string xStandardName, yStandardName, xUnits, yUnits;
@@ -40,15 +40,15 @@ struct UgridSpec {
     std::string depthName = "Mesh2_depth";
     std::string depthStandardName = "sea_floor_depth_below_geoid";
     std::string positive;
-    bool depthOfMesh = true;         // mesh and location attributes
-    bool depthFill = false;          // _FillValue = depthFillValue
+    bool depthOfMesh = true; // mesh and location attributes
+    bool depthFill = false;  // _FillValue = depthFillValue
     double depthFillValue = -999;
-    bool depthMissing = false;       // missing_value = depthFillValue
+    bool depthMissing = false; // missing_value = depthFillValue
     nc_type depthType = NC_DOUBLE;
     // The projection: the attribute of the crs variable that states it, and which variable
     // names the crs in its grid_mapping ("x", "depth").
     std::string crsAttribute = "epsg_code";
-    std::string crsText;             // for crs_wkt and the like
+    std::string crsText; // for crs_wkt and the like
     std::string gridMappingOn = "x";
 };
 
@@ -93,8 +93,8 @@ inline bool WriteUgrid(const std::string& path, const UgridSpec& s) {
         text(topo, "boundary_node_connectivity", "Mesh2_boundary_nodes");
     nc_def_var(nc, "Mesh2_node_x", NC_DOUBLE, 1, &dn, &vx);
     nc_def_var(nc, "Mesh2_node_y", NC_DOUBLE, 1, &dn, &vy);
-    const std::pair<int, const std::string*> coordAtts[] = {
-        {vx, &s.xStandardName}, {vy, &s.yStandardName}};
+    const std::pair<int, const std::string*> coordAtts[] = {{vx, &s.xStandardName},
+                                                            {vy, &s.yStandardName}};
     for (const auto& [var, sn] : coordAtts)
         if (!sn->empty())
             text(var, "standard_name", *sn);
@@ -163,7 +163,10 @@ inline bool WriteUgrid(const std::string& path, const UgridSpec& s) {
         for (size_t i = 0; i < m; ++i) {
             const int v = s.faces[f * m + i];
             double& out = faces[s.transposed ? i * faceCount + f : f * m + i];
-            out = v >= 0 ? v : s.faceType == NC_DOUBLE ? NAN : s.faceType == NC_UINT ? 4294967295.0 : -1;
+            out = v >= 0                    ? v
+                  : s.faceType == NC_DOUBLE ? NAN
+                  : s.faceType == NC_UINT   ? 4294967295.0
+                                            : -1;
         }
     nc_put_var_double(nc, vf, faces.data());
     if (vz >= 0)
