@@ -1,9 +1,6 @@
 // Items that a list's count promises but the file lacks: one warning per count, at the count,
-// however many are missing; the list still has the size the count gives.
+// however many are missing; nothing is dropped.
 #include "TestSupport.h"
-#include "core/MudTransportModuleKiv.h"
-#include "dredging/MTDredgingKiv.h"
-#include "outputs/MTOutputKiv.h"
 
 #include <gtest/gtest.h>
 
@@ -52,14 +49,6 @@ TEST(MissingItems, OneWarningPerCountAtTheCount) {
          Module("    DREDGING {\n        ZoSEKivListItemCount = 3\n        number_of_dredgers = 3\n"
                 "        DREDGER_2 {\n            weights_fraction = 50.0, 50.0\n        }\n    }\n"),
          8, "2 of 3 sections are missing (DREDGER_1, DREDGER_3)"},
-        {"outputs, far more than shown", Module("    OUTPUTS {\n        number_of_outputs = 500\n    }\n"),
-         7, "500 of 500 sections are missing (OUTPUT_1, OUTPUT_2, OUTPUT_3, OUTPUT_4, OUTPUT_5 and "
-            "495 more)"},
-        // Host lists too; the module's list follows the host's boundaries.
-        {"boundaries of the host",
-         Boundaries(3, "        BOUNDARY_1 {\n        }\n        BOUNDARY_3 {\n        }\n") +
-             Module("", 1, 1),
-         3, "1 of 3 sections is missing (BOUNDARY_2)"},
         {"boundary values of the module",
          Boundaries(1, "        BOUNDARY_1 {\n        }\n") +
              Module("    BOUNDARY_CONDITIONS {\n        ZoSEKivListItemCount = 1\n        BOUNDARY_1 {\n"
@@ -81,16 +70,6 @@ TEST(MissingItems, OneWarningPerCountAtTheCount) {
         // Nothing was dropped: the missing items are there with their defaults.
         EXPECT_TRUE(r.document->DroppedOnSave().empty());
     }
-}
-
-TEST(MissingItems, TheCountStillSizesTheList) {
-    auto doc = Load(Module("    OUTPUTS {\n        number_of_outputs = 3\n        OUTPUT_2 {\n"
-                           "            title = \"kept\"\n        }\n    }\n"
-                           "    DREDGING {\n        number_of_dredgers = 2\n    }\n"));
-    const CMTOutputKiv* outputs = GetImportant<CMTOutputKiv>(doc->Module(), "MTOutputs");
-    ASSERT_EQ(outputs->GetItemCount(), 3);
-    EXPECT_EQ(outputs->GetItem(2)->Title(), "kept");
-    EXPECT_EQ(GetImportant<CMTDredgingKiv>(doc->Module(), "MTDredgings")->GetItemCount(), 2);
 }
 
 }  // namespace
