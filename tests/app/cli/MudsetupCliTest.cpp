@@ -109,6 +109,34 @@ TEST_F(Cli, FormatIsIdempotentAndKeepsValues) {
     EXPECT_EQ(toStdout.out, once);
 }
 
+TEST_F(Cli, FormatIntoAnotherFolderKeepsTheFilesTheSetupNames) {
+    const fs::path examples = MUD_SOURCE_DIR "/examples";
+    fs::create_directories(dir / "project");
+    fs::copy(examples, dir / "project", fs::copy_options::recursive);
+    fs::create_directories(dir / "runs");
+    const std::string input = (dir / "project" / "estuary.setup").string();
+    Result r = Mudsetup("format " + input + " -o " + P("runs/moved.setup"));
+    ASSERT_EQ(r.exitCode, 0) << r.err;
+    const std::string moved = ReadFile(dir / "runs" / "moved.setup");
+    EXPECT_NE(moved.find("mesh_file = '../project/estuary.2dm'"), std::string::npos);
+    EXPECT_NE(moved.find("file_name = '../project/data/dredger_1.qrd0'"), std::string::npos);
+    EXPECT_NE(moved.find("file_name = '../project/stations.qrd0'"), std::string::npos);
+    r = Mudsetup("validate " + P("runs/moved.setup"));
+    EXPECT_EQ(r.exitCode, 0) << r.out << r.err;
+
+    // Back into its folder, and printed, the names are those of the setup's own folder.
+    const std::string original = Mudsetup("format " + input + " -o -").out;
+    EXPECT_NE(original.find("mesh_file = 'estuary.2dm'"), std::string::npos);
+    ASSERT_EQ(Mudsetup("format " + P("runs/moved.setup") + " -o " + P("project/again.setup")).exitCode, 0);
+    EXPECT_EQ(ReadFile(dir / "project" / "again.setup"), original);
+
+    // Moved without its files, the setup says what it lost.
+    fs::copy_file(dir / "project" / "estuary.setup", dir / "runs" / "alone.setup");
+    r = Mudsetup("validate " + P("runs/alone.setup"));
+    EXPECT_EQ(r.exitCode, 1);
+    EXPECT_EQ(r.out.rfind("DOMAIN: The mesh cannot be read: " + P("runs/estuary.2dm"), 0), 0u) << r.out;
+}
+
 TEST_F(Cli, WarningsGoToStandardErrorAndTheFileStillLoads) {
     WriteFile(dir / "odd.setup",
               "MUD_TRANSPORT_MODULE {\n    mode = 2\n    MODEL_DEFINITION {\n"
