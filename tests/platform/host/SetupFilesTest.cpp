@@ -311,6 +311,8 @@ TEST_F(MeshChecks, TheSetupIsHeldAgainstItsMesh) {
     } cases[] = {
         {"'squares.2dm'", "'gone.2dm'",
          {"DOMAIN: The mesh cannot be read: " + (m_project / "gone.2dm").string() + ":"}},
+        {"'squares.2dm'", "'data'",
+         {"DOMAIN: The mesh cannot be read: " + (m_project / "data").string() + ": not a regular file"}},
         {"'squares.2dm'", "'garbage.2dm'",
          {"DOMAIN: The mesh cannot be read: " + (m_project / "garbage.2dm").string() + ":"}},
         {kBothBoundaries, kFirstBoundary,
