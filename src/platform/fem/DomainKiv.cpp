@@ -233,12 +233,12 @@ int CDomainKiv::ValidateData() {
 bool CDomainKiv::CheckBoundaries(const CMesh& mesh) {
     const int stored = m_boundaries->GetItemCount();
     const int held = static_cast<int>(mesh.boundaries.size());
-    auto boundaries = [](int n) {
-        return FormatString(n == 1 ? "%d open boundary" : "%d open boundaries", n);
-    };
     if (stored != held) {
-        AddError("The mesh has " + boundaries(held) + ", the setup " + boundaries(stored) +
-                 ": open the mesh again to take its boundaries");
+        AddError(FormatString(held == 1 ? "The mesh has %d open boundary, the setup %d: open the "
+                                          "mesh again to take its boundaries"
+                                        : "The mesh has %d open boundaries, the setup %d: open the "
+                                          "mesh again to take its boundaries",
+                              held, stored));
         return false;
     }
     bool ok = true;
