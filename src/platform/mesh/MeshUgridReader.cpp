@@ -8,6 +8,7 @@
 // from longitude/latitude standard names.
 #include "MeshReader.h"
 #include "projection/ZoMapProjection.h"
+#include "fileio/NetcdfHeader.h"
 
 #include <netcdf.h>
 
@@ -29,7 +30,8 @@ struct Fail {
 
 class File {
 public:
-    explicit File(const std::string& path) : m_path(path) {
+    // maxCount: the most nodes, elements or rows the file can hold (see MaxCountOf).
+    File(const std::string& path, size_t maxCount) : m_path(path), m_maxCount(maxCount) {
         m_status = nc_open(path.c_str(), NC_NOWRITE, &m_id);
     }
     ~File() {
@@ -37,6 +39,7 @@ public:
             nc_close(m_id);
     }
     int Status() const { return m_status; }
+    size_t MaxCount() const { return m_maxCount; }
     int Id() const { return m_id; }
 
     std::string TextAtt(int var, const char* name) const {
@@ -100,6 +103,7 @@ public:
 
 private:
     std::string m_path;
+    size_t m_maxCount = 0;
     int m_id = -1;
     int m_status = NC_NOERR;
 };
@@ -152,7 +156,7 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
                    (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) +
                    " a row"};
     rows = shape[0];
-    if (rows > kMaxCount)
+    if (rows > f.MaxCount())
         throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
     std::vector<long long> raw(rows * shape[1]);
     if (!raw.empty())
@@ -281,10 +285,23 @@ std::string Projection(const File& f, int xVar) {
                                         : std::string();
 }
 
+// Every value takes at least a byte of a classic file; compressed netCDF-4 data takes at
+// least a byte in 1032 (the best that deflate does).
+size_t MaxCountOf(const fileio::NetcdfCheck& check) {
+    const auto size = static_cast<unsigned long long>(check.size);
+    const unsigned long long most =
+        check.format == fileio::NetcdfFormat::Hdf5 ? size * 1032 : size;
+    return static_cast<size_t>(std::min<unsigned long long>(most, kMaxCount));
+}
+
 } // namespace
 
 MeshReadResult ReadUgrid(const std::string& path) {
-    File f(path);
+    // A header that claims more than the file holds would make the library allocate by it.
+    fileio::NetcdfCheck check;
+    if (const auto failure = fileio::PrecheckNetcdf(path, &check))
+        return {nullptr, path + ": " + failure->Text()};
+    File f(path, MaxCountOf(check));
     if (f.Status() != NC_NOERR)
         return {nullptr, path + ": " + nc_strerror(f.Status())};
     try {
@@ -302,7 +319,7 @@ MeshReadResult ReadUgrid(const std::string& path) {
         if (xShape.size() != 1 || xShape[0] == 0)
             throw Fail{"no nodes in " + coords[0]};
         const size_t n = xShape[0];
-        if (n > kMaxCount)
+        if (n > f.MaxCount())
             throw Fail{"more nodes than can be read (" + std::to_string(n) + ")"};
         mesh->x = Doubles(f, xVar, n, coords[0]);
         mesh->y = Doubles(f, yVar, n, coords[1]);
