@@ -521,7 +521,7 @@ void CEditorWindow::SetModified(bool modified) {
 
 void CEditorWindow::UpdateTitle() {
     const QString name = m_path.isEmpty() ? tr("Untitled") : QFileInfo(m_path).fileName();
-    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor").arg(name));
+    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor %2").arg(name, QStringLiteral(MUDSETUP_VERSION)));
     setWindowModified(m_modified);
 }
 
