@@ -154,6 +154,8 @@ private:
 struct ParseResult {
     std::unique_ptr<Document> document;  // null when error is set
     std::optional<Diagnostic> error;
+    // The error came before the first section opened: the text is not a parameter file.
+    bool beforeFirstSection = false;
     fileio::FileIdentity identity;  // of the file read, to tell whether it changed since
 };
 
