@@ -320,39 +320,3 @@ TEST_F(GuardedFiles, AWriteWithTheIdentityReadReplacesOnlyTheFileThatWasRead) {
     EXPECT_TRUE(fileio::WriteFileAtomic(path, "again", &error, &written));
     EXPECT_EQ(Slurp(path), "again");
 }
-
-// The setup document remembers what it read and what it saved; Save As elsewhere is free.
-TEST_F(GuardedFiles, ASetupChangedOnDiskSinceItWasOpenedIsNotOverwritten) {
-    const std::string path = Write("a.setup", kSetup);
-    CSetupDocument::OpenResult opened = CSetupDocument::Open(path);
-    ASSERT_TRUE(opened.document);
-    CSetupDocument& doc = *opened.document;
-    std::string error;
-    bool changed = false;
-    ASSERT_TRUE(doc.SaveAs(path, &error, &changed)) << error;  // unchanged: saved
-    ASSERT_TRUE(doc.SaveAs(path, &error, &changed)) << error;  // its own save is known
-
-    const std::string theirs = "MUD_TRANSPORT_MODULE {\n    mode = 1\n}\n";
-    Write("other", theirs);
-    fs::rename(dir / "other", dir / "a.setup");
-    EXPECT_FALSE(doc.SaveAs(path, &error, &changed));
-    EXPECT_TRUE(changed);
-    EXPECT_EQ(Slurp(path), theirs);
-    EXPECT_TRUE(doc.SaveAs(P("copy.setup"), &error, &changed)) << error;
-    EXPECT_FALSE(changed);
-
-    const std::string again = Write("b.setup", kSetup);
-    CSetupDocument::OpenResult b = CSetupDocument::Open(again);
-    ASSERT_TRUE(b.document);
-    Write("other", theirs);
-    fs::rename(dir / "other", dir / "b.setup");
-    EXPECT_TRUE(b.document->SaveAs(again, &error, &changed, true)) << error;
-    EXPECT_NE(Slurp(again), theirs);
-}
-
-TEST(FileSizes, SaidAsAPersonReadsThem) {
-    EXPECT_EQ(fileio::FormatSize(900), "900 bytes");
-    EXPECT_EQ(fileio::FormatSize(1536), "1.5 KB");
-    EXPECT_EQ(fileio::FormatSize(3ll << 30), "3.0 GB");
-    EXPECT_EQ(fileio::FormatSize(0x7FFFFFFE), "2.0 GB");
-}
