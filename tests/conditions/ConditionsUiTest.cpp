@@ -106,8 +106,11 @@ TEST_F(DialogTest, DistributionGridIsLayersByFractionsAndStoresAShare) {
     EXPECT_EQ(Headings(grid), (std::vector<std::string>{"", "Fraction 1", "Fraction 2", "Fraction 3"}));
     EXPECT_EQ(Column(grid, 0), (std::vector<std::string>{"Layer 1", "Layer 2"}));
     EXPECT_EQ(Column(grid, 3), (std::vector<std::string>{"34", "34"}));
-    EXPECT_EQ(grid->columnWidth(0), 70);
-    EXPECT_EQ(grid->verticalHeader()->width(), 70);
+    // Every column as wide as its heading, the row headings as wide as theirs.
+    for (int c = 0; c < 3; ++c)
+        EXPECT_GE(grid->columnWidth(c), grid->horizontalHeader()->fontMetrics().horizontalAdvance("Fraction 1"));
+    EXPECT_GE(grid->verticalHeader()->width(), grid->verticalHeader()->fontMetrics().horizontalAdvance("Layer 2"));
+    EXPECT_FALSE(grid->LastFit().horizontalBar || grid->LastFit().verticalBar);
     EXPECT_TRUE(grid->verticalHeader()->font().bold());
 
     EnterInCell(grid, 2, 1, "40");
@@ -146,6 +149,10 @@ TEST_F(DialogTest, BoundaryConditionListViewLaysOutABlockPerBoundary) {
     EXPECT_EQ(Column(grid, 2), (std::vector<std::string>{"", "Go to...", "Go to...", "",
                                                          "Go to...", "Go to..."}));
     EXPECT_TRUE(grid->CellStyle(2, 1).readOnly);
+    // A boundary's row is its title drawn across the row, not a heading beside grey cells.
+    EXPECT_TRUE(grid->IsTitleRow(1) && grid->IsTitleRow(4));
+    EXPECT_FALSE(grid->IsTitleRow(2) || grid->IsTitleRow(6));
+    EXPECT_FALSE(grid->CellStyle(1, 1).readOnly || grid->CellStyle(1, 2).readOnly);
 
     ClickCell(grid, 6, 2);
     EXPECT_EQ(host.selected, (std::vector<CZoSEKivBase*>{
@@ -263,6 +270,13 @@ TEST_F(DialogTest, TenThousandBoundariesOpenInTheListView) {
     EXPECT_EQ(CellText(grid, 89983, 0), "B9999");
     EXPECT_EQ(CellText(grid, 90000, 0), "Fraction 8");
     EXPECT_TRUE(grid->LastFit().verticalBar);
+    // The corner's heading and the titles of boundaries far down the list are shown whole.
+    const QFontMetrics fm(grid->horizontalHeader()->font());
+    const int rowWidth = grid->verticalHeader()->width() + grid->horizontalHeader()->length();
+    EXPECT_LE(fm.horizontalAdvance("Boundary Name"), grid->verticalHeader()->width());
+    EXPECT_LE(fm.horizontalAdvance("B9999"), rowWidth);
+    EXPECT_TRUE(grid->IsTitleRow(89983));
+    EXPECT_FALSE(grid->IsTitleRow(89984));
 }
 
 TEST_F(DialogTest, SourceSheetListsTheHydrodynamicSources) {
