@@ -4,7 +4,10 @@
 #include "EditorSettings.h"
 #include "EditorWindow.h"
 #include "HelpTopics.h"
+#include "conditions/InitialConditionsKiv.h"
 #include "core/MudTransportModuleKiv.h"
+#include "dredging/MTDredgingFile.h"
+#include "dredging/MTDredgingItemsKiv.h"
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/UnitUtil.h"
 #include "forcings/ForcingsWavesKiv.h"
@@ -184,4 +187,60 @@ TEST_F(EditorPages, AOneFractionDistributionShowsItsHeadingAndHundred) {
     EXPECT_EQ(grids[0]->CellStyle(0, 1).DisplayText(), "Fraction 1");
     EXPECT_EQ(grids[0]->CellStyle(1, 1).DisplayText(), "100");
     ExpectFits(grids[0], "one fraction");
+}
+
+// A value refused as the tree is clicked keeps its form, and the tree shows that form's
+// node, current and highlighted, not the node that was clicked.
+TEST_F(EditorPages, TheTreeStaysOnTheFormThatKeepsARefusedValue) {
+    uitest::MessageRecorder messages;
+    ASSERT_TRUE(Show("MUD_TRANSPORT_MODULE/WATER_COLUMN/SETTLING_VELOCITY"));
+    CZoSEKivBase* settling = m_window->CurrentNode();
+    QLineEdit* field = nullptr;
+    for (QLineEdit* edit : Form()->findChildren<QLineEdit*>())
+        if (!field && edit->isVisible() && edit->isEnabled() && edit->inherits("CZoNumberEdit"))
+            field = edit;
+    ASSERT_TRUE(field);
+    field->setFocus();
+    field->selectAll();
+    QTest::keyClicks(field, "x");
+    QTreeWidgetItem* deposition = nullptr;
+    for (QTreeWidgetItemIterator it(m_window->Tree()); *it && !deposition; ++it)
+        if ((*it)->text(0) == "Deposition")
+            deposition = *it;
+    ASSERT_TRUE(deposition);
+    QTest::mouseClick(m_window->Tree()->viewport(), Qt::LeftButton, {},
+                      m_window->Tree()->visualItemRect(deposition).center());
+    QApplication::processEvents();
+    EXPECT_EQ(messages.Messages().size(), 1u);
+    EXPECT_EQ(m_window->CurrentNode(), settling);
+    ASSERT_TRUE(m_window->Tree()->currentItem());
+    EXPECT_EQ(m_window->Tree()->currentItem()->text(0), "Settling");
+    const QList<QTreeWidgetItem*> selected = m_window->Tree()->selectedItems();
+    ASSERT_EQ(selected.size(), 1);
+    EXPECT_EQ(selected.front()->text(0), "Settling");
+}
+
+// Messages name places by the titles the user sees, never by internal names, and the place
+// is shown whole.
+TEST_F(EditorPages, MessagesNamePlacesByTheirTitles) {
+    CZoSEKivBase* module = m_window->Document().Module();
+    auto* share = InitialConditions(module)->FractionDistribution()->GetItem(1);
+    ASSERT_TRUE(share);
+    share->GetItem(1)->ConstantValue(share->GetItem(1)->ConstantValue() + 1.0f);
+    auto* dredger = uitest::FindNodeAs<CMTDredgingItemsKiv>(module, {"DREDGING", "DREDGER_1"});
+    ASSERT_TRUE(dredger);
+    dredger->DataFile()->FileName("data/missing.qrd0");
+    EXPECT_FALSE(m_window->Validate());
+
+    QStringList sections;
+    QTreeWidget* list = m_window->Messages();
+    for (int i = 0; i < list->topLevelItemCount(); ++i)
+        sections << list->topLevelItem(i)->text(0);
+    EXPECT_TRUE(sections.contains("Initial Conditions > Fraction Distribution > Layer 1"))
+        << sections.join(" | ").toStdString();
+    EXPECT_TRUE(sections.contains("Dredging > Fairway hopper > Dredging file")) << sections.join(" | ").toStdString();
+    for (const QString& s : sections) {
+        EXPECT_FALSE(s.contains("MT ") || s.contains('_')) << s.toStdString();
+        EXPECT_LE(list->fontMetrics().horizontalAdvance(s), list->header()->sectionSize(0)) << s.toStdString();
+    }
 }
