@@ -1005,6 +1005,8 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     if (dialog) {
         layout->addWidget(dialog);
         m_dialog = dialog;
+        // The help pane follows the page on show as it follows the tree.
+        connect(dialog, &CZoSEDlgBase::helpTopicChanged, this, [this] { ShowHelpOfSelection(); });
         dialog->Attach(node, this);
         m_initializing = true;
         dialog->Initialize();
@@ -1058,8 +1060,8 @@ void CEditorWindow::RefreshDialog() {
 }
 
 unsigned long CEditorWindow::CurrentHelpId() const {
-    if (m_dialog && m_dialog->GetHelpID())
-        return m_dialog->GetHelpID();
+    if (m_dialog && m_dialog->CurrentHelpID())
+        return m_dialog->CurrentHelpID();
     if (const auto* help = dynamic_cast<const CFemHelpBase*>(m_currentNode))
         return help->GetHelpID();
     if (!m_currentNode && m_tree->currentItem() == m_hostItem)

@@ -27,6 +27,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 #include <QTextBrowser>
+#include <QToolButton>
 #include <QTreeWidget>
 
 #include <gtest/gtest.h>
@@ -242,5 +243,49 @@ TEST_F(EditorPages, MessagesNamePlacesByTheirTitles) {
     for (const QString& s : sections) {
         EXPECT_FALSE(s.contains("MT ") || s.contains('_')) << s.toStdString();
         EXPECT_LE(list->fontMetrics().horizontalAdvance(s), list->header()->sectionSize(0)) << s.toStdString();
+    }
+}
+
+// F1 and the pane's Help button show the topic of the page on show in a sheet of pages, and
+// the help pane follows the pages as it follows the tree.
+TEST_F(EditorPages, HelpShowsTheTopicOfThePageOnShow) {
+    QAction* sectionHelp = nullptr;
+    for (QAction* a : m_window->findChildren<QAction*>())
+        if (a->shortcut() == QKeySequence(QKeySequence::HelpContents))
+            sectionHelp = a;
+    ASSERT_TRUE(sectionHelp);
+    QToolButton* paneHelp = nullptr;
+    for (QToolButton* b : m_window->findChildren<QToolButton*>())
+        if (b->text() == "Help")
+            paneHelp = b;
+    ASSERT_TRUE(paneHelp);
+    const QString general = FindHelpTopic(0).title;
+    const struct {
+        const char* path;
+        const char* page;
+        unsigned long topic;
+    } pages[] = {
+        {"MUD_TRANSPORT_MODULE/OUTPUTS/OUTPUT_1", "Geographic View", 5030},
+        {"MUD_TRANSPORT_MODULE/OUTPUTS/OUTPUT_1", "Output specification", 5032},
+        {"MUD_TRANSPORT_MODULE/OUTPUTS/OUTPUT_1", "Output items", 5031},
+        {"MUD_TRANSPORT_MODULE/BOUNDARY_CONDITIONS", "Geographic View", 5013},
+        {"MUD_TRANSPORT_MODULE/BOUNDARY_CONDITIONS", "List view", 5016},
+        {"MUD_TRANSPORT_MODULE/SOURCES", "Geographic View", 5037},
+        {"MUD_TRANSPORT_MODULE/SOURCES", "List view", 5038},
+    };
+    for (const auto& p : pages) {
+        SCOPED_TRACE(std::string(p.path) + " " + p.page);
+        const QString title = FindHelpTopic(p.topic).title;
+        ASSERT_NE(title, general);
+        ASSERT_TRUE(Show(p.path, p.page));
+        // Followed on show, without asking.
+        EXPECT_TRUE(m_window->HelpView()->toPlainText().contains(title));
+        m_window->HelpView()->clear();
+        m_window->Tree()->setFocus();
+        sectionHelp->trigger();
+        EXPECT_TRUE(m_window->HelpView()->toPlainText().contains(title));
+        m_window->HelpView()->clear();
+        paneHelp->click();
+        EXPECT_TRUE(m_window->HelpView()->toPlainText().contains(title));
     }
 }
