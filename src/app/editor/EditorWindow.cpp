@@ -320,7 +320,8 @@ void CEditorWindow::BuildActions() {
                                        [this] { OnSave(); });
     saveAct->setShortcut(QKeySequence::Save);
     QAction* saveAsAct = file->addAction(tr("Save &As..."), this, [this] { OnSaveAs(); });
-    saveAsAct->setShortcut(QKeySequence::SaveAs);
+    // The platform's standard key for Save As is empty on some desktops.
+    saveAsAct->setShortcut(QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_S));
     file->addSeparator();
     QAction* quitAct = file->addAction(tr("&Quit"), this, &QWidget::close);
     quitAct->setShortcut(QKeySequence::Quit);
@@ -534,7 +535,7 @@ void CEditorWindow::SetModified(bool modified) {
 
 void CEditorWindow::UpdateTitle() {
     const QString name = m_path.isEmpty() ? tr("Untitled") : QFileInfo(m_path).fileName();
-    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor").arg(name));
+    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor %2").arg(name, QStringLiteral(MUDSETUP_VERSION)));
     setWindowModified(m_modified);
 }
 
@@ -594,6 +595,26 @@ void CEditorWindow::AddReadWarningItems() {
         item->setToolTip(1, Q(w.message));
         item->setIcon(0, icon);
         item->setData(0, Qt::UserRole + 1, item->text(0));  // what Copy puts first
+    }
+}
+
+// What reading the mesh passed over or did not find: not errors, but a modeller should see them.
+void CEditorWindow::AddMeshNoteItems() {
+    CDomainKiv* domain = Domain(m_doc.get());
+    const MeshPtr mesh = domain ? domain->Mesh() : nullptr;
+    if (!mesh)
+        return;
+    const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxInformation);
+    const QString path = Q(NodePath(domain));
+    for (const std::string& note : mesh->notes) {
+        auto* item = new QTreeWidgetItem(m_messages);
+        item->setText(0, TitlePath(domain));
+        item->setToolTip(0, path);
+        item->setData(0, Qt::UserRole + 1, path);
+        item->setText(1, tr("mesh: %1").arg(Q(note)));
+        item->setToolTip(1, Q(note));
+        item->setIcon(0, icon);
+        SetNode(item, domain);
     }
 }
 
@@ -685,6 +706,7 @@ bool CEditorWindow::RunValidation(bool quiet) {
 void CEditorWindow::FillMessages(bool valid) {
     m_messages->clear();
     AddReadWarningItems();
+    AddMeshNoteItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);
@@ -1166,7 +1188,11 @@ void CEditorWindow::UpdateRecentMenu() {
     const QStringList files = EditorSettings().value("recentFiles").toStringList();
     for (int i = 0; i < files.size(); ++i) {
         const QString path = files[i];
-        QAction* a = m_recentMenu->addAction(QStringLiteral("&%1 %2").arg(i + 1).arg(QFileInfo(path).fileName()),
+        // The folder tells apart setups of the same name; '&' would mark a key.
+        const QFileInfo info(path);
+        QString text = QStringLiteral("%1  (%2)").arg(info.fileName(), QDir::toNativeSeparators(info.absolutePath()));
+        text.replace('&', QStringLiteral("&&"));
+        QAction* a = m_recentMenu->addAction(QStringLiteral("&%1 %2").arg(i + 1).arg(text),
                                              this, [this, path] {
                                                  if (MaybeSave())
                                                      OpenFile(path);
