@@ -588,6 +588,8 @@ ValuesResult ParseValuesFrom(Source& src, const std::string& name, const ValuesR
                 first = false;
             }
         }
+        if (step == req.fieldStep && slot[static_cast<std::size_t>(item)] == 0)
+            r.field.push_back(v);
         ++r.valuesRead;
         if (++point == perStep) {
             point = 0;

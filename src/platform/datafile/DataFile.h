@@ -97,12 +97,15 @@ struct ValuesRequest {
     std::int64_t point = 0;
     std::int64_t maxSteps = 1000000;
     bool check = true;  // read to the end and check the number of values
+    // When >= 0: every point of the first requested item at this step, into ValuesResult::field.
+    std::int64_t fieldStep = -1;
 };
 
 struct ValuesResult {
     std::optional<Error> error;
     // rows[step][k] is the value of request.items[k] at request.point.
     std::vector<std::vector<double>> rows;
+    std::vector<double> field;  // see ValuesRequest::fieldStep
     std::int64_t valuesRead = 0;
     double minimum = 0, maximum = 0;  // over all finite values read
 };

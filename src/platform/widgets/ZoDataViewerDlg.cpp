@@ -2,12 +2,19 @@
 
 #include "FemBase.h"
 #include "ZoSEDlgBase.h"
+#include "fem/UnitUtil.h"
 
 #include <QAbstractTableModel>
+#include <QCheckBox>
+#include <QComboBox>
 #include <QDialogButtonBox>
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QLabel>
+#include <QMouseEvent>
+#include <QPushButton>
+#include <QSlider>
+#include <QWheelEvent>
 #include <QPainter>
 #include <QPainterPath>
 #include <QPlainTextEdit>
@@ -93,90 +100,215 @@ CZoLinePlot::CZoLinePlot(QWidget* parent) : QWidget(parent) {
     setMinimumSize(240, 160);
     setBackgroundRole(QPalette::Base);
     setAutoFillBackground(true);
+    setCursor(Qt::OpenHandCursor);
 }
 
 void CZoLinePlot::SetData(std::vector<double> times, std::vector<Series> series) {
     m_times = std::move(times);
     m_series = std::move(series);
+    m_view0 = FullStart();
+    m_view1 = FullEnd();
     update();
+}
+
+double CZoLinePlot::FullStart() const { return m_times.empty() ? 0 : m_times.front(); }
+double CZoLinePlot::FullEnd() const {
+    return m_times.size() > 1 ? m_times.back() : FullStart() + 1;
+}
+
+void CZoLinePlot::SetSeriesVisible(int k, bool visible) {
+    if (k < 0 || k >= SeriesCount())
+        return;
+    m_series[static_cast<std::size_t>(k)].visible = visible;
+    update();
+}
+
+bool CZoLinePlot::SeriesVisible(int k) const {
+    return k >= 0 && k < SeriesCount() && m_series[static_cast<std::size_t>(k)].visible;
+}
+
+QStringList CZoLinePlot::Axes() const {
+    QStringList axes;
+    for (const Series& s : m_series)
+        if (s.visible && !axes.contains(s.quantity))
+            axes << s.quantity;
+    return axes;
+}
+
+void CZoLinePlot::SetView(double t0, double t1) {
+    const double full0 = FullStart(), full1 = FullEnd();
+    const double fullSpan = full1 - full0;
+    // Not narrower than a second nor wider than the data, and kept over the data.
+    double span = std::clamp(t1 - t0, std::min(1.0, fullSpan), fullSpan);
+    t0 = std::clamp(t0, full0, full1 - span);
+    if (t0 == m_view0 && t0 + span == m_view1)
+        return;
+    m_view0 = t0;
+    m_view1 = t0 + span;
+    update();
+    emit ViewChanged();
+}
+
+void CZoLinePlot::Zoom(double factor, double at) {
+    if (!(factor > 0) || !std::isfinite(at))
+        return;
+    SetView(at - (at - m_view0) * factor, at + (m_view1 - at) * factor);
+}
+
+void CZoLinePlot::Pan(double seconds) { SetView(m_view0 + seconds, m_view1 + seconds); }
+
+void CZoLinePlot::ResetView() { SetView(FullStart(), FullEnd()); }
+
+double CZoLinePlot::TimeAt(double x) const {
+    const double w = std::max(1, m_right - m_left);
+    return m_view0 + (x - m_left) / w * (m_view1 - m_view0);
+}
+
+void CZoLinePlot::wheelEvent(QWheelEvent* event) {
+    const int delta = event->angleDelta().y();
+    if (delta == 0)
+        return;
+    Zoom(std::pow(0.8, delta / 120.0), TimeAt(event->position().x()));
+    event->accept();
+}
+
+void CZoLinePlot::mousePressEvent(QMouseEvent* event) {
+    if (event->button() == Qt::LeftButton) {
+        m_dragX = event->position().x();
+        setCursor(Qt::ClosedHandCursor);
+    }
+}
+
+void CZoLinePlot::mouseMoveEvent(QMouseEvent* event) {
+    if (!m_dragX)
+        return;
+    const double x = event->position().x();
+    Pan(TimeAt(*m_dragX) - TimeAt(x));
+    m_dragX = x;
+}
+
+void CZoLinePlot::mouseReleaseEvent(QMouseEvent*) {
+    m_dragX.reset();
+    setCursor(Qt::OpenHandCursor);
 }
 
 void CZoLinePlot::paintEvent(QPaintEvent*) {
     QPainter p(this);
     p.setRenderHint(QPainter::Antialiasing);
     const QFontMetrics fm(font());
-    double lo = 0, hi = 0;
-    bool any = false;
-    for (const Series& s : m_series)
-        for (double v : s.values)
-            if (std::isfinite(v)) {
-                lo = any ? std::min(lo, v) : v;
-                hi = any ? std::max(hi, v) : v;
-                any = true;
-            }
-    if (m_times.empty() || !any) {
+    const QStringList axes = Axes();
+    if (m_times.empty() || axes.isEmpty()) {
         p.drawText(rect(), Qt::AlignCenter, tr("No values to show"));
         return;
     }
-    if (hi - lo < 1e-300) {
-        const double pad = std::max(std::fabs(lo) * 0.1, 1.0);
-        lo -= pad;
-        hi += pad;
+    const double t0 = m_view0, t1 = m_view1;
+    struct Panel {
+        double lo = 0, hi = 0, step = 1;
+        bool any = false;
+        QStringList labels;
+    };
+    std::vector<Panel> panels(static_cast<std::size_t>(axes.size()));
+    for (const Series& s : m_series) {
+        if (!s.visible)
+            continue;
+        Panel& pn = panels[static_cast<std::size_t>(axes.indexOf(s.quantity))];
+        const std::size_t n = std::min(s.values.size(), m_times.size());
+        for (std::size_t i = 0; i < n; ++i) {
+            const double v = s.values[i];
+            if (!std::isfinite(v) || m_times[i] < t0 || m_times[i] > t1)
+                continue;
+            pn.lo = pn.any ? std::min(pn.lo, v) : v;
+            pn.hi = pn.any ? std::max(pn.hi, v) : v;
+            pn.any = true;
+        }
     }
-    const double yStep = NiceStep(hi - lo, 5);
-    lo = std::floor(lo / yStep) * yStep;
-    hi = std::ceil(hi / yStep) * yStep;
-    const double t0 = m_times.front();
-    const double t1 = m_times.size() > 1 ? m_times.back() : t0 + 1;
-
     int labelWidth = 0;
-    for (double y = lo; y <= hi + yStep / 2; y += yStep)
-        labelWidth = std::max(labelWidth, fm.horizontalAdvance(Number(std::fabs(y) < yStep * 1e-9 ? 0 : y)));
-    const int legendHeight = fm.height() + 6;
-    const QRect area(labelWidth + 12, legendHeight + 6, width() - labelWidth - 24,
-                     height() - legendHeight - 2 * fm.height() - 18);
-    if (area.width() < 20 || area.height() < 20)
-        return;
-    auto X = [&](double t) { return area.left() + (t - t0) / (t1 - t0) * area.width(); };
-    auto Y = [&](double v) { return area.bottom() - (v - lo) / (hi - lo) * area.height(); };
-
-    const QColor grid = palette().color(QPalette::Mid);
-    p.setPen(QPen(grid, 0, Qt::DotLine));
-    for (double y = lo; y <= hi + yStep / 2; y += yStep) {
-        const double shown = std::fabs(y) < yStep * 1e-9 ? 0 : y;
-        const int py = static_cast<int>(std::lround(Y(y)));
-        p.setPen(QPen(grid, 0, Qt::DotLine));
-        p.drawLine(area.left(), py, area.right(), py);
-        p.setPen(palette().color(QPalette::Text));
-        p.drawText(QRect(0, py - fm.height() / 2, labelWidth + 6, fm.height()),
-                   Qt::AlignRight | Qt::AlignVCenter, Number(shown));
+    for (Panel& pn : panels) {
+        if (!pn.any) {
+            pn.lo = 0;
+            pn.hi = 1;
+        }
+        if (pn.hi - pn.lo < 1e-300) {
+            const double pad = std::max(std::fabs(pn.lo) * 0.1, 1.0);
+            pn.lo -= pad;
+            pn.hi += pad;
+        }
+        pn.step = NiceStep(pn.hi - pn.lo, 4);
+        pn.lo = std::floor(pn.lo / pn.step) * pn.step;
+        pn.hi = std::ceil(pn.hi / pn.step) * pn.step;
+        for (double y = pn.lo; y <= pn.hi + pn.step / 2; y += pn.step) {
+            pn.labels << Number(std::fabs(y) < pn.step * 1e-9 ? 0 : y);
+            labelWidth = std::max(labelWidth, fm.horizontalAdvance(pn.labels.back()));
+        }
     }
-    const int xTicks = std::max(1, std::min(5, area.width() / (fm.horizontalAdvance("0000-00-00") + 20)));
-    for (int i = 0; i <= xTicks; ++i) {
-        const double t = t0 + (t1 - t0) * i / xTicks;
+    const int legendHeight = fm.height() + 6;
+    const int top = legendHeight + 6;
+    const int bottom = height() - 2 * fm.height() - 12;
+    const int gap = fm.height() + 10;  // room for each panel's quantity
+    const int panelCount = static_cast<int>(panels.size());
+    const int panelHeight = (bottom - top - gap * panelCount) / panelCount;
+    m_left = labelWidth + 12;
+    m_right = width() - 12;
+    if (m_right - m_left < 20 || panelHeight < 20)
+        return;
+    auto X = [&](double t) { return m_left + (t - t0) / (t1 - t0) * (m_right - m_left); };
+    const QColor grid = palette().color(QPalette::Mid);
+    const QColor text = palette().color(QPalette::Text);
+    const int xTicks = std::max(1, std::min(5, (m_right - m_left) / (fm.horizontalAdvance("0000-00-00") + 20)));
+
+    std::vector<QRect> areas;
+    for (int a = 0; a < panelCount; ++a) {
+        const Panel& pn = panels[static_cast<std::size_t>(a)];
+        const QRect area(m_left, top + a * (panelHeight + gap) + gap, m_right - m_left, panelHeight);
+        areas.push_back(area);
+        p.setPen(text);
+        p.drawText(QRect(area.left(), area.top() - gap, area.width(), gap - 2), Qt::AlignLeft | Qt::AlignBottom,
+                   axes[a]);
+        int i = 0;
+        for (double y = pn.lo; y <= pn.hi + pn.step / 2; y += pn.step, ++i) {
+            const int py = static_cast<int>(std::lround(area.bottom() - (y - pn.lo) / (pn.hi - pn.lo) * area.height()));
+            p.setPen(QPen(grid, 0, Qt::DotLine));
+            p.drawLine(area.left(), py, area.right(), py);
+            p.setPen(text);
+            p.drawText(QRect(0, py - fm.height() / 2, labelWidth + 6, fm.height()), Qt::AlignRight | Qt::AlignVCenter,
+                       pn.labels.value(i));
+        }
+        for (int k = 0; k <= xTicks; ++k) {
+            const int px = static_cast<int>(std::lround(X(t0 + (t1 - t0) * k / xTicks)));
+            p.setPen(QPen(grid, 0, Qt::DotLine));
+            p.drawLine(px, area.top(), px, area.bottom());
+        }
+        p.setPen(text);
+        p.drawRect(area);
+    }
+    // Times under the lowest panel only.
+    const int below = areas.back().bottom() + 4;
+    p.setPen(text);
+    for (int k = 0; k <= xTicks; ++k) {
+        const double t = t0 + (t1 - t0) * k / xTicks;
         const int px = static_cast<int>(std::lround(X(t)));
-        p.setPen(QPen(grid, 0, Qt::DotLine));
-        p.drawLine(px, area.top(), px, area.bottom());
-        p.setPen(palette().color(QPalette::Text));
-        const QString text = Q(datafile::FormatDateTime(static_cast<std::int64_t>(std::floor(t))));
-        const QStringList parts = text.split(' ');
+        const QStringList parts = Q(datafile::FormatDateTime(static_cast<std::int64_t>(std::floor(t)))).split(' ');
         const int w = fm.horizontalAdvance(parts.value(0)) + 4;
         const int left = std::clamp(px - w / 2, 0, std::max(0, width() - w));
-        p.drawText(QRect(left, area.bottom() + 4, w, fm.height()), Qt::AlignCenter, parts.value(0));
-        p.drawText(QRect(left, area.bottom() + 4 + fm.height(), w, fm.height()), Qt::AlignCenter,
-                   parts.value(1).left(5));
+        p.drawText(QRect(left, below, w, fm.height()), Qt::AlignCenter, parts.value(0));
+        p.drawText(QRect(left, below + fm.height(), w, fm.height()), Qt::AlignCenter, parts.value(1).left(5));
     }
-    p.setPen(palette().color(QPalette::Text));
-    p.drawRect(area);
 
-    int legendX = area.left();
+    int legendX = m_left;
     for (std::size_t k = 0; k < m_series.size(); ++k) {
+        const Series& s = m_series[k];
+        if (!s.visible)
+            continue;
+        const int a = static_cast<int>(axes.indexOf(s.quantity));
+        const Panel& pn = panels[static_cast<std::size_t>(a)];
+        const QRect& area = areas[static_cast<std::size_t>(a)];
+        auto Y = [&](double v) { return area.bottom() - (v - pn.lo) / (pn.hi - pn.lo) * area.height(); };
         const QColor colour = kColours[k % std::size(kColours)];
         QPainterPath path;
         bool open = false;
-        const std::size_t n = std::min(m_series[k].values.size(), m_times.size());
+        const std::size_t n = std::min(s.values.size(), m_times.size());
         for (std::size_t i = 0; i < n; ++i) {
-            const double v = m_series[k].values[i];
+            const double v = s.values[i];
             if (!std::isfinite(v)) {
                 open = false;
                 continue;
@@ -191,14 +323,111 @@ void CZoLinePlot::paintEvent(QPaintEvent*) {
         p.setPen(QPen(colour, 1.5));
         p.setClipRect(area.adjusted(-1, -1, 1, 1));
         p.drawPath(path);
-        if (n == 1)
-            p.drawEllipse(QPointF(X(m_times[0]), Y(m_series[k].values[0])), 2.5, 2.5);
+        if (n == 1 && std::isfinite(s.values[0]))
+            p.drawEllipse(QPointF(X(m_times[0]), Y(s.values[0])), 2.5, 2.5);
         p.setClipping(false);
         p.drawLine(legendX, 3 + fm.height() / 2, legendX + 16, 3 + fm.height() / 2);
-        p.setPen(palette().color(QPalette::Text));
-        const QString& name = m_series[k].name;
-        p.drawText(legendX + 20, 3 + fm.ascent(), name);
-        legendX += 32 + fm.horizontalAdvance(name);
+        p.setPen(text);
+        p.drawText(legendX + 20, 3 + fm.ascent(), s.name);
+        legendX += 32 + fm.horizontalAdvance(s.name);
+    }
+}
+
+CZoFieldView::CZoFieldView(QWidget* parent) : QWidget(parent) {
+    setMinimumSize(240, 160);
+    setBackgroundRole(QPalette::Base);
+    setAutoFillBackground(true);
+}
+
+void CZoFieldView::SetField(std::vector<double> values, std::int64_t columns, std::int64_t rows, QString title) {
+    m_values = std::move(values);
+    m_columns = std::max<std::int64_t>(columns, 1);
+    m_rows = std::max<std::int64_t>(rows, 1);
+    m_title = std::move(title);
+    bool any = false;
+    for (double v : m_values)
+        if (std::isfinite(v)) {
+            m_lo = any ? std::min(m_lo, v) : v;
+            m_hi = any ? std::max(m_hi, v) : v;
+            any = true;
+        }
+    if (!any)
+        m_lo = m_hi = 0;
+    update();
+}
+
+QColor CZoFieldView::ColourOf(double v) const {
+    if (!std::isfinite(v))
+        return palette().color(QPalette::Base);
+    const double f = m_hi > m_lo ? std::clamp((v - m_lo) / (m_hi - m_lo), 0.0, 1.0) : 0.5;
+    // Blue through green to red: low to high.
+    return QColor::fromHsvF(static_cast<float>((1 - f) * 240.0 / 360.0), 0.85f, 0.95f);
+}
+
+QStringList CZoFieldView::LegendLabels() const {
+    QStringList labels;
+    if (m_values.empty())
+        return labels;
+    constexpr int kSteps = 5;
+    for (int i = 0; i <= kSteps; ++i)
+        labels << Number(m_lo + (m_hi - m_lo) * i / kSteps);
+    labels.removeDuplicates();
+    return labels;
+}
+
+void CZoFieldView::paintEvent(QPaintEvent*) {
+    QPainter p(this);
+    const QFontMetrics fm(font());
+    if (m_values.empty()) {
+        p.drawText(rect(), Qt::AlignCenter, tr("No values to show"));
+        return;
+    }
+    const QStringList labels = LegendLabels();
+    int labelWidth = 0;
+    for (const QString& l : labels)
+        labelWidth = std::max(labelWidth, fm.horizontalAdvance(l));
+    const int legendWidth = 20 + 6 + labelWidth + 8;
+    const int top = fm.height() + 8;
+    const QRect room(8, top, width() - legendWidth - 24, height() - top - 8);
+    if (room.width() < 20 || room.height() < 20)
+        return;
+    p.setPen(palette().color(QPalette::Text));
+    p.drawText(QRect(8, 2, width() - 16, fm.height() + 4), Qt::AlignLeft | Qt::AlignVCenter, m_title);
+    // Square cells; row 1 at the bottom as on a map.
+    const double cell = std::min(static_cast<double>(room.width()) / static_cast<double>(m_columns),
+                                 static_cast<double>(room.height()) / static_cast<double>(m_rows));
+    const QRectF field(room.left(), room.top(), cell * static_cast<double>(m_columns),
+                       cell * static_cast<double>(m_rows));
+    const bool edges = cell >= 6;
+    p.setPen(edges ? QPen(palette().color(QPalette::Mid), 0) : QPen(Qt::NoPen));
+    for (std::size_t i = 0; i < m_values.size(); ++i) {
+        const auto c = static_cast<std::int64_t>(i) % m_columns;
+        const auto r = static_cast<std::int64_t>(i) / m_columns;
+        if (r >= m_rows)
+            break;
+        p.setBrush(ColourOf(m_values[i]));
+        p.drawRect(QRectF(field.left() + cell * static_cast<double>(c),
+                          field.bottom() - cell * static_cast<double>(r + 1), cell, cell));
+    }
+    p.setBrush(Qt::NoBrush);
+    p.setPen(palette().color(QPalette::Text));
+    p.drawRect(field);
+
+    // The legend: a colour bar from the lowest value (bottom) to the highest.
+    const QRect bar(width() - legendWidth - 8, top + fm.height() / 2, 20,
+                    std::min(room.height() - fm.height(), 240));
+    for (int y = 0; y < bar.height(); ++y) {
+        const double f = 1.0 - static_cast<double>(y) / std::max(1, bar.height() - 1);
+        p.setPen(ColourOf(m_lo + (m_hi - m_lo) * f));
+        p.drawLine(bar.left(), bar.top() + y, bar.right(), bar.top() + y);
+    }
+    p.setPen(palette().color(QPalette::Text));
+    p.drawRect(bar);
+    for (int i = 0; i < labels.size(); ++i) {
+        const int y = labels.size() == 1 ? bar.center().y()
+                                         : bar.bottom() - bar.height() * i / static_cast<int>(labels.size() - 1);
+        p.drawText(QRect(bar.right() + 6, y - fm.height() / 2, labelWidth + 4, fm.height()),
+                   Qt::AlignLeft | Qt::AlignVCenter, labels[i]);
     }
 }
 
@@ -227,9 +456,15 @@ CZoDataViewerDlg::CZoDataViewerDlg(const CString& path, const std::vector<int>& 
     m_model = new CZoSeriesModel(m_table);
     m_table->setModel(m_model);
     m_table->horizontalHeader()->setSectionResizeMode(QHeaderView::ResizeToContents);
-    m_plot = new CZoLinePlot(m_tabs);
+    auto* plotPage = new QWidget(m_tabs);
+    auto* plotLayout = new QVBoxLayout(plotPage);
+    m_checkRow = new QHBoxLayout;
+    plotLayout->addLayout(m_checkRow);
+    m_plot = new CZoLinePlot(plotPage);
     m_plot->setObjectName("plot");
-    m_tabs->addTab(m_plot, tr("Plot"));
+    m_plot->setToolTip(tr("Wheel: zoom the time axis; drag: move along it"));
+    plotLayout->addWidget(m_plot, 1);
+    m_tabs->addTab(plotPage, tr("Plot"));
     m_tabs->addTab(m_table, tr("Table"));
     layout->addWidget(m_tabs, 1);
 
@@ -279,6 +514,26 @@ CZoDataViewerDlg::CZoDataViewerDlg(const CString& path, const std::vector<int>& 
     }
     m_headerText->setPlainText(text);
 
+    for (std::size_t k = 0; k < m_items.size(); ++k) {
+        const datafile::Item& it = h.items[static_cast<std::size_t>(m_items[k] - 1)];
+        auto* check = new QCheckBox(Q(it.name), this);
+        check->setObjectName(QString("item%1").arg(m_items[k]));
+        check->setChecked(true);
+        connect(check, &QCheckBox::toggled, this,
+                [this, k](bool on) { m_plot->SetSeriesVisible(static_cast<int>(k), on); });
+        m_checkRow->addWidget(check);
+        m_checks.push_back(check);
+    }
+    m_checkRow->addStretch(1);
+    m_reset = new QPushButton(tr("Whole Period"), this);
+    m_reset->setObjectName("resetView");
+    m_reset->setEnabled(false);
+    connect(m_reset, &QPushButton::clicked, m_plot, &CZoLinePlot::ResetView);
+    connect(m_plot, &CZoLinePlot::ViewChanged, this, [this] {
+        m_reset->setEnabled(m_plot->ViewStart() > m_times0 || m_plot->ViewEnd() < m_times1);
+    });
+    m_checkRow->addWidget(m_reset);
+
     const bool spatial = h.kind != datafile::Kind::TimeSeries;
     m_pointLabel->setVisible(spatial);
     m_point->setVisible(spatial);
@@ -290,6 +545,67 @@ CZoDataViewerDlg::CZoDataViewerDlg(const CString& path, const std::vector<int>& 
     m_point->setValue(1);
     connect(m_point, &QSpinBox::valueChanged, this, [this] { Load(); });
     Load();
+
+    if (h.kind == datafile::Kind::Grid || h.kind == datafile::Kind::MeshData) {
+        auto* page = new QWidget(m_tabs);
+        auto* pageLayout = new QVBoxLayout(page);
+        auto* row = new QHBoxLayout;
+        m_fieldItem = new QComboBox(page);
+        m_fieldItem->setObjectName("fieldItem");
+        for (int n : m_items)
+            m_fieldItem->addItem(Q(h.items[static_cast<std::size_t>(n - 1)].name), n);
+        row->addWidget(new QLabel(tr("Item"), page));
+        row->addWidget(m_fieldItem);
+        row->addWidget(new QLabel(tr("Time step"), page));
+        m_stepSlider = new QSlider(Qt::Horizontal, page);
+        m_stepSlider->setObjectName("step");
+        m_stepSlider->setRange(1, static_cast<int>(std::min<std::int64_t>(h.time.steps, INT32_MAX)));
+        m_stepSlider->setPageStep(std::max(1, m_stepSlider->maximum() / 10));
+        row->addWidget(m_stepSlider, 1);
+        m_stepLabel = new QLabel(page);
+        m_stepLabel->setObjectName("stepTime");
+        row->addWidget(m_stepLabel);
+        pageLayout->addLayout(row);
+        m_field = new CZoFieldView(page);
+        m_field->setObjectName("field");
+        pageLayout->addWidget(m_field, 1);
+        m_tabs->insertTab(0, page, tr("Field"));
+        m_tabs->setCurrentIndex(0);
+        connect(m_stepSlider, &QSlider::valueChanged, this, [this] { LoadField(); });
+        connect(m_fieldItem, &QComboBox::currentIndexChanged, this, [this] { LoadField(); });
+        LoadField();
+    }
+}
+
+void CZoDataViewerDlg::LoadField() {
+    if (!m_header || !m_field || m_fieldItem->currentIndex() < 0)
+        return;
+    const datafile::Header& h = *m_header;
+    const int item = m_fieldItem->currentData().toInt();
+    const std::int64_t step = m_stepSlider->value() - 1;
+    datafile::ValuesRequest req;
+    req.items = {item - 1};
+    req.point = -1;
+    req.fieldStep = step;
+    req.maxSteps = step + 1;
+    req.check = false;
+    datafile::ValuesResult v = datafile::ReadValues(m_path, req);
+    const std::int64_t time = h.time.start + static_cast<std::int64_t>(std::floor(h.time.step * static_cast<double>(step)));
+    m_stepLabel->setText(tr("%1 of %2: %3").arg(step + 1).arg(h.time.steps).arg(Q(datafile::FormatDateTime(time))));
+    const datafile::Item& it = h.items[static_cast<std::size_t>(item - 1)];
+    const QString title = QString("%1 [%2]").arg(Q(it.name), Q(it.unit));
+    if (h.kind == datafile::Kind::Grid) {
+        m_field->SetField(std::move(v.field), h.columns, h.rows, title);
+    } else {
+        // No geometry in the file: the values in their numbering, in a square block.
+        const auto n = static_cast<std::int64_t>(v.field.size());
+        const auto columns = std::max<std::int64_t>(1, static_cast<std::int64_t>(std::ceil(std::sqrt(static_cast<double>(n)))));
+        const QString what = h.location == datafile::MeshLocation::Nodes ? tr("nodes") : tr("elements");
+        m_field->SetField(std::move(v.field), columns, (n + columns - 1) / columns,
+                          tr("%1, %2 1 to %3 from the bottom left, row by row").arg(title, what).arg(n));
+    }
+    if (v.error)
+        m_status->setText(Q(v.error->ToString()));
 }
 
 CZoDataViewerDlg::~CZoDataViewerDlg() = default;
@@ -319,13 +635,21 @@ void CZoDataViewerDlg::Load() {
         const datafile::Item& it = h.items[static_cast<std::size_t>(m_items[k] - 1)];
         const QString name = QString("%1 [%2]").arg(Q(it.name), Q(it.unit));
         headers << name;
-        CZoLinePlot::Series s{name, {}};
+        const QuantityInfo* known = CUnitUtil::FindQuantity(it.unitType);
+        const QString quantity = QString("%1 [%2]").arg(known ? QString(known->name) : QString::number(it.unitType), Q(it.unit));
+        CZoLinePlot::Series s{name, {}, quantity, true};
         for (const auto& row : v.rows)
             s.values.push_back(row[k]);
         series.push_back(std::move(s));
     }
     m_model->Set(times, headers, std::move(v.rows));
+    m_times0 = times.empty() ? 0 : times.front();
+    m_times1 = times.size() > 1 ? times.back() : m_times0 + 1;
     m_plot->SetData(std::move(times), std::move(series));
+    for (std::size_t k = 0; k < m_checks.size(); ++k)
+        m_plot->SetSeriesVisible(static_cast<int>(k), m_checks[k]->isChecked());
+    if (m_reset)
+        m_reset->setEnabled(false);
     if (v.error)
         m_status->setText(Q(v.error->ToString()));
     else if (h.time.steps > kMaxRows)

@@ -185,6 +185,18 @@ TEST(DataFile, ValuesAreReadForTheItemsAndPointAskedAndCounted) {
     ASSERT_EQ(r.rows.size(), 2u);
     EXPECT_EQ(r.rows[0][0], 3);
     EXPECT_TRUE(std::isnan(r.rows[1][0]));
+
+    // A field: every point of the first item asked, at one step, the other item between.
+    const std::string grid = "qrd2 1\nstart 2024-01-01 00:00\nstep 60\nsteps 2\ngrid 2 1\nitems 2\n"
+                             "item a 100084\nitem b 100084\nvalues\n1 2 3 4\n5 6 7 8\n";
+    req = {};
+    req.items = {1};
+    req.point = -1;
+    req.fieldStep = 1;
+    r = ParseValues(grid, "g.qrd2", req);
+    ASSERT_FALSE(r.error) << r.error->ToString();
+    EXPECT_EQ(r.field, (std::vector<double>{7, 8}));
+    EXPECT_TRUE(r.rows.empty());
 }
 
 TEST(DataFile, BadValuesGiveTheirPlace) {
