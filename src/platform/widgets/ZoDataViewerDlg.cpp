@@ -370,7 +370,7 @@ QStringList CZoFieldView::LegendLabels() const {
         return labels;
     constexpr int kSteps = 5;
     for (int i = 0; i <= kSteps; ++i)
-        labels << Number(m_lo + (m_hi - m_lo) * i / kSteps);
+        labels << QLocale::c().toString(m_lo + (m_hi - m_lo) * i / kSteps, 'g', 4);
     labels.removeDuplicates();
     return labels;
 }

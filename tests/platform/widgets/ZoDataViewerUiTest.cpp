@@ -151,6 +151,7 @@ TEST(DataViewerField, GridsAndMeshDataShowAFieldPerStepWithALegend) {
         EXPECT_EQ(viewer.Field()->Values(), (std::vector<double>{-1, 0, 1, 2, 3}));
         EXPECT_EQ(viewer.Field()->Minimum(), -1);
         EXPECT_EQ(viewer.Field()->Maximum(), 3);
+        EXPECT_EQ(viewer.Field()->LegendLabels()[2], "0.6");  // not 0.6000000000000001
         Shoot(viewer, "viewer_mesh");
     }
     {
