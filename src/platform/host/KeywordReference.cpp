@@ -4,7 +4,8 @@
 
 namespace {
 
-// One item of every list, so that every kind of node stands in the tree once.
+// An item of every list, and two layers for the transition between them, so that every
+// kind of node stands in the tree.
 constexpr const char* kSample = R"(DOMAIN {
     BOUNDARY_NAMES {
         ZoSEKivListItemCount = 1
@@ -16,7 +17,7 @@ HYDRODYNAMIC_SOURCES {
 MUD_TRANSPORT_MODULE {
     MODEL_DEFINITION {
         number_of_fractions = 1
-        number_of_layers = 1
+        number_of_layers = 2
     }
     FORCINGS {
         WAVES {

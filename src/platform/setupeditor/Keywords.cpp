@@ -46,6 +46,7 @@ void KeywordSink::AddAt(const std::string& path, const KeywordDecl& d) {
 
 void KeywordSink::Add(KeywordEntry entry) {
     entry.path = KeywordPathPattern(entry.path);
+    entry.keyword = KeywordPathPattern(entry.keyword);
     for (const KeywordEntry& e : m_entries)
         if (e.path == entry.path && e.keyword == entry.keyword)
             return;
