@@ -1,8 +1,13 @@
 // A string as a JSON string literal, for the commands' --json output.
 #pragma once
 
+#include "paramfile/ParamFile.h"
+
 #include <cstdio>
 #include <string>
+#include <vector>
+
+class CZoSEKivBase;
 
 namespace cli {
 
@@ -27,5 +32,12 @@ inline std::string JsonString(const std::string& s) {
     }
     return out + "\"";
 }
+
+// Messages for machines: {"severity": ..., "text": ..., and "path" and "title_path" for a
+// node's message, or "file", "line" and "column" for one from reading}.
+std::string JsonMessage(const char* severity, const paramfile::Diagnostic& d);
+std::string JsonMessage(const char* severity, const CZoSEKivBase* node, const std::string& text);
+// "[m1, m2]" with one message a line at the given indent.
+std::string JsonArray(const std::vector<std::string>& items, int indent);
 
 }  // namespace cli
