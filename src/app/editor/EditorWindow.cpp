@@ -585,6 +585,26 @@ void CEditorWindow::AddReadWarningItems() {
     }
 }
 
+// What reading the mesh passed over or did not find: not errors, but a modeller should see them.
+void CEditorWindow::AddMeshNoteItems() {
+    CDomainKiv* domain = Domain(m_doc.get());
+    const MeshPtr mesh = domain ? domain->Mesh() : nullptr;
+    if (!mesh)
+        return;
+    const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxInformation);
+    const QString path = Q(NodePath(domain));
+    for (const std::string& note : mesh->notes) {
+        auto* item = new QTreeWidgetItem(m_messages);
+        item->setText(0, TitlePath(domain));
+        item->setToolTip(0, path);
+        item->setData(0, Qt::UserRole + 1, path);
+        item->setText(1, tr("mesh: %1").arg(Q(note)));
+        item->setToolTip(1, Q(note));
+        item->setIcon(0, icon);
+        SetNode(item, domain);
+    }
+}
+
 bool CEditorWindow::SaveFile(const QString& path) {
     Validate();
     if (const auto& dropped = m_doc->DroppedOnSave(); !dropped.empty()) {
@@ -673,6 +693,7 @@ bool CEditorWindow::RunValidation(bool quiet) {
 void CEditorWindow::FillMessages(bool valid) {
     m_messages->clear();
     AddReadWarningItems();
+    AddMeshNoteItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);

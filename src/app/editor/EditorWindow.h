@@ -126,6 +126,7 @@ private:
     void UpdateTitle();
     QMessageBox::StandardButton Ask(const Prompt& prompt);
     void AddReadWarningItems();
+    void AddMeshNoteItems();
 
     std::vector<ShownEntry> CollectModuleEntries() const;
     void RebuildTree();

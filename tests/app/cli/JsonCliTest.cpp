@@ -143,7 +143,7 @@ TEST(JsonCli, MeshAndDataFileInfoHoldTheDocumentedFields) {
     const CliRun mesh = Mudsetup("mesh info --json " MUD_SOURCE_DIR "/examples/estuary.2dm");
     EXPECT_EQ(mesh.exitCode, 0);
     ExpectMessages(mesh.doc);
-    ExpectFields(mesh.doc, {{"nodes", T::Number}, {"elements", T::Number}, {"triangles", T::Number},
+    ExpectFields(mesh.doc, {{"topology", T::String}, {"bed_level_missing", T::Number}, {"nodes", T::Number}, {"elements", T::Number}, {"triangles", T::Number},
                             {"quadrilaterals", T::Number}, {"extent", T::Object},
                             {"projection", T::String}, {"open_boundaries", T::Array}},
                  "mesh");
