@@ -153,9 +153,9 @@ void CForcingsWaveDBListKiv::DescribeKeywords(KeywordSink& sink) {
     // wind direction numbers.
     static const KeywordDecl kDecls[] = {
         {"file_name", KeywordType::FileName, "''", "Wave-field file of the database point", 0, "", "", "Data_Base_Item_%d_%d_%d"},
-        {kItemNumberKeywords[0], KeywordType::Int, "1", "Item of the file for the wave height", 0, ">= 1", "", "Data_Base_Item_%d_%d_%d"},
-        {kItemNumberKeywords[1], KeywordType::Int, "2", "Item of the file for the wave period", 0, ">= 1", "", "Data_Base_Item_%d_%d_%d"},
-        {kItemNumberKeywords[2], KeywordType::Int, "3", "Item of the file for the wave direction", 0, ">= 1", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[0], KeywordType::Int, "1", "Item of the file for the wave height", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[1], KeywordType::Int, "2", "Item of the file for the wave period", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[2], KeywordType::Int, "3", "Item of the file for the wave direction", 0, "", "", "Data_Base_Item_%d_%d_%d"},
     };
     sink.Add(kDecls);
 }
