@@ -452,6 +452,11 @@ void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state
         return;  // texts come from ToText: cannot happen
     }
     m_state = state;
+    ShowAgain(path, hadNode);
+}
+
+void CEditorWindow::ShowAgain(const CString& path, bool hadNode) {
+    m_restoring = true;
     RebuildTree();
     CZoSEKivBase* target = nullptr;
     if (hadNode)
@@ -558,6 +563,9 @@ bool CEditorWindow::OpenFile(const QString& path) {
     SetDocument(std::move(opened.document), QFileInfo(path).absoluteFilePath());
     AddRecentFile(m_path);
     ShowReadWarnings(opened.warnings);
+    // A setup that disagrees with its files (a mesh or data file gone) says so at once.
+    if (!RunValidation(true))
+        m_messagesDock->show();
     if (opened.warnings.empty())
         statusBar()->showMessage(tr("Opened %1").arg(path), 5000);
     return true;
@@ -628,7 +636,20 @@ bool CEditorWindow::SaveFile(const QString& path) {
             return false;
     }
     std::string error;
-    if (!m_doc->SaveAs(path.toStdString(), &error)) {
+    bool changed = false;
+    bool saved = m_doc->SaveAs(path.toStdString(), &error, &changed);
+    if (!saved && changed) {
+        const QMessageBox::StandardButton answer =
+            Ask({QMessageBox::Warning, tr("Save Setup"),
+                 tr("%1 was changed by another program since it was opened or saved here.\n\n"
+                    "Overwrite it with this setup?")
+                     .arg(path),
+                 QMessageBox::Save | QMessageBox::Cancel});
+        if (answer != QMessageBox::Save)
+            return false;
+        saved = m_doc->SaveAs(path.toStdString(), &error, nullptr, true);
+    }
+    if (!saved) {
         Ask({QMessageBox::Critical, tr("Save Setup"),
              tr("The setup could not be saved to %1:\n\n%2\n\nThe file was not changed.")
                  .arg(path, Q(error)),
@@ -636,12 +657,25 @@ bool CEditorWindow::SaveFile(const QString& path) {
         return false;
     }
     m_path = QFileInfo(path).absoluteFilePath();
-    m_undo->setClean();
-    SetModified(false);
-    AddRecentFile(m_path);
     // The file now holds what the setup holds: what reading said of the old one is past
     // (the list shows it until the next validation).
     m_readWarnings.clear();
+    if (m_state && m_doc->ToText() != *m_state) {
+        // Saved into another folder, relative file names were rewritten to name the same
+        // files from there: the form shows the new names, the states before hold the old
+        // ones (no longer right from here), and the files are checked from the new place.
+        CloseDialog(false);
+        const CString shown = m_currentNode ? NodePath(m_currentNode) : CString();
+        const bool hadNode = m_currentNode != nullptr;
+        m_currentNode = nullptr;
+        ShowAgain(shown, hadNode);
+        StartNewHistory();
+        RunValidation(false);
+    } else {
+        m_undo->setClean();
+        SetModified(false);
+    }
+    AddRecentFile(m_path);
     const int problems = static_cast<int>(m_doc->Errors().size());
     statusBar()->showMessage(problems ? tr("Saved %1 with %2")
                                             .arg(path, Plural(problems, "validation message", "validation messages"))
