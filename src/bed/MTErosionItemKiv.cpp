@@ -26,7 +26,7 @@ struct ErosionItemFields {
     using F = KivField<CMTErosionItemKiv>;
     // The default of "description" depends on the layer: SetDefault sets it.
     static inline const F kFields[] = {
-        F::Flag("description", &CMTErosionItemKiv::m_softMud, false),
+        F::Flag("description", &CMTErosionItemKiv::m_softMud, false).Choices("0 hard bed, 1 soft mud").Doc("Whether the layer erodes as soft mud"),
     };
 };
 
@@ -71,3 +71,5 @@ const char* CMTErosionItemKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMTErosionItemDlg"
                                            : CZoSEKivBase::GetDlgRuntimeClass(code);
 }
+
+void CMTErosionItemKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, ErosionItemFields::kFields); }

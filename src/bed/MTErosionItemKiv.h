@@ -24,6 +24,7 @@ public:
     CFemInDataKiv* PowerOfErosionValue() const { return m_power; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     // Sets the mud type only: a power of erosion stored in the file stays in force.
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }

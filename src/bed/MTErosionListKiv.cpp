@@ -6,7 +6,7 @@ struct ErosionListFields {
     using F = KivField<CMTErosionListKiv>;
     static inline const F kFields[] = {
         F::DoubleAsFloat("max_concentration_due_to_erosion",
-                         &CMTErosionListKiv::m_maxConcentration, 50.0),
+                         &CMTErosionListKiv::m_maxConcentration, 50.0).Unit(100403).Doc("Largest concentration erosion may bring about"),
     };
 };
 
@@ -26,3 +26,5 @@ const char* CMTErosionListKiv::GetDlgRuntimeClass(unsigned code) {
                ? "CMTErosionListDlg"
                : CMTCountListKiv<CMTErosionItemKiv>::GetDlgRuntimeClass(code);
 }
+
+void CMTErosionListKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, ErosionListFields::kFields); }

@@ -12,6 +12,7 @@ public:
     void MaxConcentration(double value) { m_maxConcentration = value; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

@@ -6,9 +6,9 @@ struct MorphologyFields {
     using F = KivField<CMTMorphologyKiv>;
     using K = CMTMorphologyKiv;
     static inline const F kFields[] = {
-        F::Bool("include_morphological_update", &K::m_includeUpdate, false),
-        F::Bool("include_speedup", &K::m_includeSpeedup, false),
-        F::DoubleAsFloat("speedup_factor", &K::m_speedupFactor, 1.0),
+        F::Bool("include_morphological_update", &K::m_includeUpdate, false).Doc("Whether the bed level follows erosion and deposition"),
+        F::Bool("include_speedup", &K::m_includeSpeedup, false).Doc("Whether bed-level changes are sped up"),
+        F::DoubleAsFloat("speedup_factor", &K::m_speedupFactor, 1.0).Doc("Factor by which bed-level changes are sped up"),
     };
 };
 
@@ -27,3 +27,5 @@ const char* CMTMorphologyKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMTMorphologyDlg"
                                            : CZoSEKivBase::GetDlgRuntimeClass(code);
 }
+
+void CMTMorphologyKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, MorphologyFields::kFields); }

@@ -15,6 +15,7 @@ public:
     void SpeedupFactor(double factor) { m_speedupFactor = factor; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

@@ -5,7 +5,7 @@
 struct TransitionListFields {
     using F = KivField<CMTTransitionListKiv>;
     static inline const F kFields[] = {
-        F::Bool("include_transition", &CMTTransitionListKiv::m_includeTransition, false),
+        F::Bool("include_transition", &CMTTransitionListKiv::m_includeTransition, false).Doc("Whether mass passes from layer to layer by consolidation"),
     };
 };
 
@@ -28,3 +28,5 @@ const char* CMTTransitionListKiv::GetDlgRuntimeClass(unsigned code) {
                ? "CMTTransitionListDlg"
                : CMTCountListKiv<CMTTransitionItemKiv>::GetDlgRuntimeClass(code);
 }
+
+void CMTTransitionListKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, TransitionListFields::kFields); }

@@ -13,6 +13,7 @@ public:
     void IncludeTransition(bool include) { m_includeTransition = include; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     // Nothing to edit below two layers.

@@ -25,9 +25,9 @@ struct DistributionElementFields {
     using F = KivField<CInitialConditionsFractionDistributionItemElementKiv>;
     using K = CInitialConditionsFractionDistributionItemElementKiv;
     static inline const F kFields[] = {
-        F::Float("constant_value", &K::m_constant, 0.0f),
-        F::FileName("file_name", &K::m_fileName, ""),
-        F::Int("item_number", &K::m_itemNumber, 1),
+        F::Float("constant_value", &K::m_constant, 0.0f).Unit(100013).Doc("Share of the fraction in the layer at the start, as a constant"),
+        F::FileName("file_name", &K::m_fileName, "").Doc("Data file of the share, where it varies over the domain"),
+        F::Int("item_number", &K::m_itemNumber, 1).Doc("Item of the data file that holds the share"),
     };
 };
 
@@ -168,4 +168,12 @@ CInitialConditionsKiv::~CInitialConditionsKiv() { GetRoot()->UnregisterImportant
 
 CInitialConditionsKiv* InitialConditions(const CZoSEKivBase* node) {
     return GetImportant<CInitialConditionsKiv>(node, kKey);
+}
+
+void CInitialConditionsFractionDistributionItemElementKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, DistributionElementFields::kFields); }
+
+void CInitialConditionsFractionDistributionItemKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kFormat{"format", KeywordType::Int, "0",
+                                     "How the layer's shares of the fractions are given"};
+    sink.Add(kFormat);
 }

@@ -45,6 +45,7 @@ public:
     void ItemNumber(int n) { m_itemNumber = n; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
 
 private:
@@ -71,6 +72,7 @@ public:
     void SetItemCount(int count, int level) override;
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
 

@@ -1,5 +1,6 @@
 #include "MTBoundaryConditionsKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTFollowedCount.h"
 #include "fem/BoundaryNamesKiv.h"
 
@@ -131,3 +132,7 @@ const char* CMTBoundaryConditionsKiv::GetDlgRuntimeClass(unsigned code) {
 CMTBoundaryConditionsKiv* MTBoundaryConditions(const CZoSEKivBase* node) {
     return GetImportant<CMTBoundaryConditionsKiv>(node, kKey);
 }
+
+// CODE_1 is written empty: it holds no keyword. The items take their boundaries' section
+// names here, as on writing.
+void CMTBoundaryConditionsKiv::DescribeKeywords(KeywordSink&) { NameComponents(); }

@@ -51,6 +51,7 @@ public:
 
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     bool IsDlgUsedInSetup() override { return GetItemCount() > 0; }

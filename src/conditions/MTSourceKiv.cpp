@@ -1,5 +1,6 @@
 #include "MTSourceKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTFollowedCount.h"
 #include "hydro/HDSourcesKiv.h"
 #include "watercolumn/MTReadChecks.h"
@@ -129,4 +130,17 @@ const char* CMTSourceKiv::GetDlgRuntimeClass(unsigned code) {
 
 CMTSourceKiv* MTSources(const CZoSEKivBase* node) {
     return GetImportant<CMTSourceKiv>(node, kKey);
+}
+
+void CMTSourceItemSubKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kType{"type_of_component", KeywordType::Int, "0",
+                                   "What the source brings of the fraction", 0, "",
+                                   "0 specified concentration, 1 excess concentration"};
+    sink.Add(kType);
+}
+
+void CMTSourceItemKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kName{"name", KeywordType::String, "",
+                                   "Name of the hydrodynamic source, as the host names it"};
+    sink.Add(kName);
 }

@@ -22,6 +22,7 @@ public:
     static CString TypeText(int type);
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;
@@ -47,6 +48,7 @@ public:
     CMTSourceItemSubKiv* Create() override;
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;

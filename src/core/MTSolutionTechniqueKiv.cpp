@@ -6,12 +6,12 @@ struct SolutionTechniqueFields {
     using F = KivField<CMTSolutionTechniqueKiv>;
     using K = CMTSolutionTechniqueKiv;
     static inline const F kFields[] = {
-        F::Int("scheme_of_time_integration", &K::m_timeIntegration, 2),
-        F::Int("scheme_of_space_discretization_horizontal", &K::m_spaceHorizontal, 2),
-        F::Int("scheme_of_space_discretization_vertical", &K::m_spaceVertical, 3),
-        F::Int("method_of_space_discretization_horizontal", &K::m_methodHorizontal, 0),
-        F::Int("integration_method", &K::m_integrationMethod, 1),
-        F::Int("update_frequency", &K::m_updateFrequency, 1),
+        F::Int("scheme_of_time_integration", &K::m_timeIntegration, 2).Choices("1 low order, fast algorithm, 2 higher order").Doc("Order of the time integration"),
+        F::Int("scheme_of_space_discretization_horizontal", &K::m_spaceHorizontal, 2).Choices("1 low order, fast algorithm, 2 higher order").Doc("Order of the horizontal discretisation"),
+        F::Int("scheme_of_space_discretization_vertical", &K::m_spaceVertical, 3).Doc("Order of the vertical discretisation"),
+        F::Int("method_of_space_discretization_horizontal", &K::m_methodHorizontal, 0).Doc("Method of the horizontal discretisation"),
+        F::Int("integration_method", &K::m_integrationMethod, 1).Doc("Method of integration"),
+        F::Int("update_frequency", &K::m_updateFrequency, 1).Doc("Time steps between updates of the bed"),
     };
 };
 
@@ -41,3 +41,5 @@ const char* CMTSolutionTechniqueKiv::GetDlgRuntimeClass(unsigned code) {
 }
 
 void CMTSolutionTechniqueKiv::SetDefault() { DefaultFields(*this, SolutionTechniqueFields::kFields); }
+
+void CMTSolutionTechniqueKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, SolutionTechniqueFields::kFields); }

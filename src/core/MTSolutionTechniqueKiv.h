@@ -17,6 +17,7 @@ public:
     void SyncVerticalScheme();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

@@ -1,5 +1,6 @@
 #include "MudTransportModuleKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTForcingsGroupKiv.h"
 #include "MTSolutionTechniqueKiv.h"
 #include "MTWaterColumnKiv.h"
@@ -55,4 +56,10 @@ bool CMudTransportModuleKiv::IsDlgUsedInSetup() { return ModuleSelection(this)->
 const char* CMudTransportModuleKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMudTransportModuleDlg"
                                            : CFemKivGroupBase::GetDlgRuntimeClass(code);
+}
+
+void CMudTransportModuleKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kMode{"mode", KeywordType::Int, "2",
+                                   "How the module runs, as the module selection says"};
+    sink.Add(kMode);
 }

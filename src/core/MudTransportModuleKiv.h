@@ -10,6 +10,7 @@ public:
     ~CMudTransportModuleKiv() override;
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override;  // the module is in use when its mode is 2

@@ -1,5 +1,6 @@
 #include "ParameterSelectionKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "paramfile/Kiv.h"
 
 #include <cstring>
@@ -117,4 +118,23 @@ const char* CParameterSelectionKiv::GetDlgRuntimeClass(unsigned code) {
 
 CParameterSelectionKiv* ModelDefinition(const CZoSEKivBase* node) {
     return GetImportant<CParameterSelectionKiv>(node, kKey);
+}
+
+void CParameterSelectionKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kDecls[] = {
+        {"number_of_fractions", KeywordType::Int, "1", "Number of sediment fractions", 0, "1 .. 8"},
+        {"number_of_layers", KeywordType::Int, "1", "Number of bed layers", 0, "1 .. 12"},
+    };
+    sink.Add(kDecls);
+    // The engine's constants stand in sections of their own beside this one.
+    for (const EngineConstant& c : kEngineConstants) {
+        KeywordEntry e;
+        e.path = sink.Outer() + "/" + c.section;
+        e.keyword = c.keyword;
+        e.type = KeywordType::Int;
+        e.defaultValue = std::to_string(c.value);
+        e.range = e.defaultValue;
+        e.description = "A constant of the engine; always written as " + e.defaultValue;
+        sink.Add(std::move(e));
+    }
 }

@@ -25,6 +25,7 @@ public:
     void Save(void* h) override;
     void Load(void* h) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     bool IsDlgUsedInSetup() override { return true; }

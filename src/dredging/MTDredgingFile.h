@@ -31,6 +31,7 @@ public:
     bool ReadTrack(std::vector<double>& x, std::vector<double>& y, CString* error = nullptr) const;
 
     void WriteData(void*) override {}
+    void DescribeKeywords(KeywordSink&) override {}
     void ReadData(void*) override {}
     // The selector must accept the file with its four items, and the name must end in
     // "qrd0" or "kx0".

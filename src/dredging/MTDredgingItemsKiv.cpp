@@ -51,13 +51,13 @@ struct DredgerFields {
     using F = KivField<D>;
     // Written before the weights, in this order.
     static inline const F kFields[] = {
-        F::Int("include", &D::m_include, 1),
-        F::String("name", &D::m_name, ""),
-        F::Int("type", &D::m_type, D::kSpillBottom),
-        F::Bool("update_dredger", &D::m_updateDredger, true),
-        F::Double("initial_dredger_mass", &D::m_initialMass, 0.0),
-        F::Double("maximum_dredger_mass", &D::m_maximumMass, 1e7),
-        F::Bool("update_distribution", &D::m_updateDistribution, true),
+        F::Int("include", &D::m_include, 1).Choices("0 excluded, 1 included").Doc("Whether the dredger takes part in the simulation"),
+        F::String("name", &D::m_name, "").Doc("Name of the dredger"),
+        F::Int("type", &D::m_type, D::kSpillBottom).Doc("Where the dredger releases its spill"),
+        F::Bool("update_dredger", &D::m_updateDredger, true).Doc("Whether the dredger's load is updated as it dredges and spills"),
+        F::Double("initial_dredger_mass", &D::m_initialMass, 0.0).Unit(100076).Doc("Mass in the dredger at the start"),
+        F::Double("maximum_dredger_mass", &D::m_maximumMass, 1e7).Unit(100076).Doc("Mass the dredger can hold"),
+        F::Bool("update_distribution", &D::m_updateDistribution, true).Doc("Whether the split of the dredged mass over the fractions is updated"),
     };
 };
 
@@ -222,4 +222,19 @@ void CMTDredgingItemsKiv::SetDefault() {
     m_weights = EvenWeights(Fractions(this));
     m_coordinateType = DefaultCoordinateType(this);
     m_file->SetDefault();
+}
+
+void CMTDredgingItemsKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kDecls[] = {
+        {kWeights, KeywordType::DoubleList, "", "Split of the dredged mass over the fractions, one weight a fraction (they sum to 100)", 0, ">= 0"},
+        {"coordinate_type", KeywordType::String, "", "Map projection of the dredger's track"},
+        {"file_name", KeywordType::FileName, "''", "Time series of the dredger: x, y, rate of dredged mass, spill"},
+        {kItemNumbers, KeywordType::IntList, "1, 2, 3, 4", "Items of the file for x, y, rate of dredged mass and spill"},
+        {"item_name_x", KeywordType::String, "\"\"", "Name of the file's item for x"},
+        {"item_name_y", KeywordType::String, "\"\"", "Name of the file's item for y"},
+        {"item_rate_of_dredged_mass", KeywordType::String, "\"\"", "Name of the file's item for the rate of dredged mass"},
+        {"item_name_spill", KeywordType::String, "\"\"", "Name of the file's item for the spill"},
+    };
+    DescribeFields(sink, DredgerFields::kFields);
+    sink.Add(kDecls);
 }

@@ -59,6 +59,7 @@ public:
     bool IsDlgUsedInSetup() override { return m_include != 0; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override;

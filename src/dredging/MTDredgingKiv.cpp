@@ -51,3 +51,11 @@ const char* CMTDredgingKiv::GetDlgRuntimeClass(unsigned code) {
                ? "CMTDredgingDlg"
                : CZoSEKivListBase<CMTDredgingItemsKiv>::GetDlgRuntimeClass(code);
 }
+
+void CMTDredgingKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kDecls[] = {
+        {kCount, KeywordType::Int, "0", "Number of dredgers (as ZoSEKivListItemCount)"},
+        {"update_bed", KeywordType::Bool, "true", "Whether dredging changes the bed"},
+    };
+    sink.Add(kDecls);
+}

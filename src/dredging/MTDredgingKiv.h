@@ -13,6 +13,7 @@ public:
     void UpdateBed(bool update) { m_updateBed = update; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

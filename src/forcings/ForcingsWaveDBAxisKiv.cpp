@@ -9,13 +9,13 @@ constexpr unsigned kMsgValuesOutOfRange = 4127;
 
 const CForcingsWaveDBAxisKiv::Layout kWindSpeed = {
     "Waves Database Wind Speed", "WIND_SPEED", "starting_value_of_wind_speed",
-    "increment_value_of_wind_speed", "number_of_wind_speeds", 5.0, 5.0, 1, false, false};
+    "increment_value_of_wind_speed", "number_of_wind_speeds", 5.0, 5.0, 1, false, false, 100274, "wind speed"};
 const CForcingsWaveDBAxisKiv::Layout kWindDirection = {
     "Waves Database Wind Direction", "WIND_DIRECTION", "starting_value_of_wind_direction",
-    "increment_value_of_wind_direction", "number_of_wind_directions", 90.0, 90.0, 1, false, true};
+    "increment_value_of_wind_direction", "number_of_wind_directions", 90.0, 90.0, 1, false, true, 100003, "wind direction"};
 const CForcingsWaveDBAxisKiv::Layout kWaterLevel = {
     "Waves Database Water Level", "WATER_LEVEL", "starting_value_of_water_level",
-    "increment_value_of_water_level", "number_of_water_levels", 0.0, 1.0, 1, true, true};
+    "increment_value_of_water_level", "number_of_water_levels", 0.0, 1.0, 1, true, true, 100000, "water level"};
 }  // namespace
 
 CForcingsWaveDBAxisKiv::CForcingsWaveDBAxisKiv(const Layout& layout, CZoSEKivBase* parent)
@@ -71,3 +71,24 @@ CForcingsWaveDBWindDirectionKiv::CForcingsWaveDBWindDirectionKiv(CZoSEKivBase* p
     : CForcingsWaveDBAxisKiv(kWindDirection, parent) {}
 CForcingsWaveDBWaterLevelKiv::CForcingsWaveDBWaterLevelKiv(CZoSEKivBase* parent)
     : CForcingsWaveDBAxisKiv(kWaterLevel, parent) {}
+
+void CForcingsWaveDBAxisKiv::DescribeKeywords(KeywordSink& sink) {
+    // The table gives types and defaults; the axis adds its quantity and the ranges that
+    // IsValid checks.
+    KeywordSink fields;
+    fields.Begin(sink.Path(), sink.Outer());
+    DescribeFields(fields, Fields().fields);
+    const std::string what = m_layout.quantity;
+    const char* ranges[] = {m_layout.startMayBeNegative ? "" : ">= 0",
+                            m_layout.incrementMayBeZero ? ">= 0" : "> 0", ">= 0"};
+    const std::string texts[] = {"First " + what + " of the database",
+                                 "Step between the " + what + "s of the database",
+                                 "Number of " + what + "s in the database"};
+    for (size_t i = 0; i < fields.Entries().size(); ++i) {
+        KeywordEntry e = fields.Entries()[i];
+        e.unitType = i < 2 ? m_layout.unitType : 0;
+        e.range = ranges[i];
+        e.description = texts[i];
+        sink.Add(std::move(e));
+    }
+}

@@ -17,6 +17,8 @@ public:
         int count;
         bool startMayBeNegative;
         bool incrementMayBeZero;
+        long unitType;
+        const char* quantity;  // "wind speed"
     };
 
     CForcingsWaveDBAxisKiv(const Layout& layout, CZoSEKivBase* parent);
@@ -37,6 +39,7 @@ public:
     bool IsValid() const;
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     // "Values out of range" when IsValid fails.
     int ValidateData() override;

@@ -14,6 +14,7 @@ public:
     bool CheckFile();
 
     void WriteData(void*) override {}
+    void DescribeKeywords(KeywordSink&) override {}
     void ReadData(void*) override {}
     void SetDefault() override;
     int ValidateData() override;

@@ -1,5 +1,6 @@
 #include "ForcingsWaveDBListKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "ForcingsWaveDBAxisKiv.h"
 #include "ForcingsWaveDBFile.h"
 #include "paramfile/Kiv.h"
@@ -145,4 +146,16 @@ void CForcingsWaveDBListKiv::ReadData(void* h) {
         }
         f->ItemNumber(items);
     }
+}
+
+void CForcingsWaveDBListKiv::DescribeKeywords(KeywordSink& sink) {
+    // One section per point of the database, named by its wind speed, water level and
+    // wind direction numbers.
+    static const KeywordDecl kDecls[] = {
+        {"file_name", KeywordType::FileName, "''", "Wave-field file of the database point", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[0], KeywordType::Int, "1", "Item of the file for the wave height", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[1], KeywordType::Int, "2", "Item of the file for the wave period", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+        {kItemNumberKeywords[2], KeywordType::Int, "3", "Item of the file for the wave direction", 0, "", "", "Data_Base_Item_%d_%d_%d"},
+    };
+    sink.Add(kDecls);
 }

@@ -58,6 +58,7 @@ public:
     // The count follows the axes; the stored one is not used.
     void LoadSize(void* h) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

@@ -14,11 +14,11 @@ struct WavesFields {
     using F = KivField<CForcingsWavesKiv>;
     using K = CForcingsWavesKiv;
     static inline const F kFields[] = {
-        F::DoubleAsFloat("minimum_waterdepth_for_including_waves", &K::m_minimumDepth, 0.0),
-        F::Bool("include_liquefaction", &K::m_includeLiquefaction, false),
-        F::Double("liquefaction_factor", &K::m_liquefactionFactor, 1.0),
-        F::Int("shearstress_formulation", &K::m_shearStress, 3),
-        F::Int("type", &K::m_type, 0),
+        F::DoubleAsFloat("minimum_waterdepth_for_including_waves", &K::m_minimumDepth, 0.0).Unit(100000).Doc("Depth below which waves are left out"),
+        F::Bool("include_liquefaction", &K::m_includeLiquefaction, false).Doc("Whether waves liquefy the bed"),
+        F::Double("liquefaction_factor", &K::m_liquefactionFactor, 1.0).Doc("Factor of the liquefaction"),
+        F::Int("shearstress_formulation", &K::m_shearStress, 3).Doc("Formulation of the bed shear stress of waves and current"),
+        F::Int("type", &K::m_type, 0).Choices("0 no waves, 1 wave field, 2 wave database, 3 spectral-wave field").Doc("Where the waves come from"),
     };
 };
 
@@ -96,3 +96,5 @@ const char* CForcingsWavesKiv::GetDlgRuntimeClass(unsigned code) {
 CForcingsWavesKiv* WavesSection(const CZoSEKivBase* node) {
     return GetImportant<CForcingsWavesKiv>(node, kKey);
 }
+
+void CForcingsWavesKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, WavesFields::kFields); }

@@ -40,6 +40,7 @@ public:
     static const std::vector<CString>& ShearStressTexts();  // by formulation
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     // Never fails. A database type that the wind forcing no longer allows becomes "No waves",
     // so that the engine never reads it; the message list says so.

@@ -23,6 +23,7 @@ public:
     bool CheckFile();
 
     void WriteData(void*) override {}
+    void DescribeKeywords(KeywordSink&) override {}
     void ReadData(void*) override {}
     void SetDefault() override;
     // "File is not valid" when CheckFile fails.

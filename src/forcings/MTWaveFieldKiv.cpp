@@ -20,15 +20,15 @@ struct WaveFieldFields {
     using K = CMTWaveFieldKiv;
     // Before the file's keywords.
     static inline const F kHead[] = {
-        F::Int("format", &K::m_format, 0),
-        F::Double("wave_height", &K::m_height, 1.0),
-        F::Double("wave_period", &K::m_period, 3.0),
-        F::Double("wave_direction", &K::m_direction, 180.0),
+        F::Int("format", &K::m_format, 0).Doc("How the wave field is given"),
+        F::Double("wave_height", &K::m_height, 1.0).Unit(100084).Doc("Wave height when constant"),
+        F::Double("wave_period", &K::m_period, 3.0).Unit(100085).Doc("Wave period when constant"),
+        F::Double("wave_direction", &K::m_direction, 180.0).Unit(100407).Doc("Wave direction when constant"),
     };
     // After them.
     static inline const F kTail[] = {
-        F::Int("type_of_soft_start", &K::m_softType, 2),
-        F::Double("soft_time_interval", &K::m_softInterval, 0.0),
+        F::Int("type_of_soft_start", &K::m_softType, 2).Doc("Shape of the soft start of the waves"),
+        F::Double("soft_time_interval", &K::m_softInterval, 0.0).Unit(100290).Doc("Time over which the waves are brought in"),
     };
 };
 
@@ -82,4 +82,19 @@ void CMTWaveFieldKiv::SetDefault() {
 
 CMTWaveFieldKiv* WaveFieldSection(const CZoSEKivBase* node) {
     return GetImportant<CMTWaveFieldKiv>(node, kKey);
+}
+
+void CMTWaveFieldKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kFile[] = {
+        {"file_name", KeywordType::FileName, "''", "Data file of the wave field"},
+        {kItemNumberKeywords[0], KeywordType::Int, "1", "Item of the file for the wave height"},
+        {kItemNumberKeywords[1], KeywordType::Int, "2", "Item of the file for the wave period"},
+        {kItemNumberKeywords[2], KeywordType::Int, "3", "Item of the file for the wave direction"},
+        {kItemNameKeywords[0], KeywordType::String, "\"\"", "Name of the file's item for the wave height"},
+        {kItemNameKeywords[1], KeywordType::String, "\"\"", "Name of the file's item for the wave period"},
+        {kItemNameKeywords[2], KeywordType::String, "\"\"", "Name of the file's item for the wave direction"},
+    };
+    DescribeFields(sink, WaveFieldFields::kHead);
+    sink.Add(kFile);
+    DescribeFields(sink, WaveFieldFields::kTail);
 }

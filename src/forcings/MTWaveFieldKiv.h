@@ -33,6 +33,7 @@ public:
     int DirectionUnitType() const { return m_directionUnitType; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     void SetDefault() override;

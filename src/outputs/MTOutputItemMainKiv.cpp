@@ -1,5 +1,6 @@
 #include "MTOutputItemMainKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTOutputCoordListKiv.h"
 #include "MTOutputItemSubDischargeKiv.h"
 #include "MTOutputItemSubKiv.h"
@@ -451,4 +452,43 @@ void CMTOutputItemMainKiv::Notify(CFemNotifier* notifier, ENotifyMessage message
         m_layerMax = domain->LayerTotNum();
     }
     CFemListener::Notify(notifier, message);
+}
+
+void CMTOutputItemMainKiv::DescribeKeywords(KeywordSink& sink) {
+    using T = KeywordType;
+    static const KeywordDecl kDecls[] = {
+        {"include", T::Int, "1", "Whether the simulation writes the output", 0, "", "0 excluded, 1 included"},
+        {"title", T::String, "\"OUTPUTXXX\"", "Title of the output"},
+        {"file_name", T::ResultFileName, "''", "Result file the output writes"},
+        {"type", T::Int, "1", "Kind of output", 0, "", "1 2D parameters, 2 3D parameters, 3 mass budget, 4 discharge"},
+        {"format", T::Int, "0", "Where the output writes: points (.qrd0), a line (.qrd1) or an area (.qrdu)"},
+        {"flood_and_dry", T::Int, "2", "How dry elements are treated in the output"},
+        {"coordinate_type", T::String, "", "Map projection of the output's coordinates"},
+        {"zone", T::Int, "0", "Always 0; not read"},
+        {"input_file_name", T::FileName, "''", "Point file the output's points were imported from"},
+        {"input_format", T::Int, "1", "Format of the input file"},
+        {"interpolation_type", T::Int, "2", "Interpolation of values at the output's points"},
+        {"first_time_step", T::Int, "0", "First time step written", 0, "0 .. number_of_time_steps"},
+        {"last_time_step", T::Int, "", "Last time step written (default: the simulation's last)", 0, "first_time_step .. number_of_time_steps"},
+        {"time_step_frequency", T::Int, "1", "Time steps between two written", 0, "1 .. number_of_time_steps"},
+        {"number_of_points", T::Int, "0", "Number of the output's points", 0, "0 .. 100000"},
+        {"name", T::String, "", "Name of the point", 0, "", "", "POINT_%d"},
+        {"x", T::Double, "", "Easting of the point", 100183, "", "", "POINT_%d"},
+        {"y", T::Double, "", "Northing of the point", 100183, "", "", "POINT_%d"},
+        {"z", T::Double, "", "Elevation of the point", 100280, "", "", "POINT_%d"},
+        {"layer", T::Int, "1", "Layer of the point", 0, "", "", "POINT_%d"},
+        {"npoints", T::Int, "3", "Number of points along the line", 0, "", "", "LINE"},
+        {"x_first", T::Double, "", "Easting of the line's first point", 100183, "", "", "LINE"},
+        {"y_first", T::Double, "", "Northing of the line's first point", 100183, "", "", "LINE"},
+        {"z_first", T::Double, "", "Elevation of the line's first point", 100280, "", "", "LINE"},
+        {"x_last", T::Double, "", "Easting of the line's last point", 100183, "", "", "LINE"},
+        {"y_last", T::Double, "", "Northing of the line's last point", 100183, "", "", "LINE"},
+        {"z_last", T::Double, "", "Elevation of the line's last point", 100280, "", "", "LINE"},
+        {"number_of_points", T::Int, "", "Number of corners of the area's polygon", 0, "0 .. 100000", "", "AREA"},
+        {"x", T::Double, "", "Easting of the corner", 100183, "", "", "AREA/POINT_%d"},
+        {"y", T::Double, "", "Northing of the corner", 100183, "", "", "AREA/POINT_%d"},
+        {"layer_min", T::Int, "1", "Lowest layer of the area", 0, "", "", "AREA"},
+        {"layer_max", T::Int, "1", "Highest layer of the area", 0, "", "", "AREA"},
+    };
+    sink.Add(kDecls);
 }

@@ -115,6 +115,7 @@ public:
     bool IsDlgUsedInSetup() override { return m_include != 0; }
     const char* GetDlgRuntimeClass(unsigned code) override;
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     // CheckData, then the points against the mesh (too slow for CheckData's other callers).
     int ValidateData() override;

@@ -1,5 +1,6 @@
 #include "MTOutputItemSubDischargeKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTOutputItemMainKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "paramfile/Kiv.h"
@@ -47,4 +48,11 @@ void CMTOutputItemSubDischargeKiv::Notify(CFemNotifier* notifier, ENotifyMessage
     if (message == kNotifyFractions)
         Rebuild();
     CFemListener::Notify(notifier, message);
+}
+
+void CMTOutputItemSubDischargeKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kType{"Type", KeywordType::Int, "1", "Quantities of the discharge output",
+                                   0, "", "1 basic, 2 extended"};
+    sink.Add(kType);
+    COutputItemsKiv::DescribeKeywords(sink);
 }

@@ -1,5 +1,6 @@
 #include "MTOutputItemSubKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "MTOutputItemMainKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "fem/DomainKiv.h"
@@ -233,4 +234,20 @@ std::shared_ptr<const CMTOutputItemSubKiv::Table> CMTOutputItemSub3DKiv::MakeTab
         a.push_back({"W Velocity", "W_VELOCITY", 3});
         a.push_back({"CFL number", "CFL_NUMBER", 3});
     });
+}
+
+void CMTOutputItemSubKiv::DescribeKeywords(KeywordSink& sink) {
+    auto add = [&](const Quantity& q, const char* kind) {
+        KeywordEntry e;
+        e.path = sink.Path();
+        e.keyword = q.keyword;
+        e.type = KeywordType::Int;
+        e.choices = "0 not written, 1 written";
+        e.description = std::string("Whether the output writes ") + kind + q.label;
+        sink.Add(std::move(e));
+    };
+    for (size_t i = 0; i < m_table->basic.size(); ++i)
+        add(m_table->basic[i], "");
+    for (size_t i = 0; i < m_table->additional.size(); ++i)
+        add(m_table->additional[i], "the additional quantity ");
 }

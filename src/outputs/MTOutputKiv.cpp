@@ -1,5 +1,6 @@
 #include "MTOutputKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "paramfile/Kiv.h"
 
 namespace {
@@ -45,4 +46,10 @@ void CMTOutputKiv::ReadData(void* h) {
 const char* CMTOutputKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMTOutputDlg"
                                            : CZoSEKivListBase::GetDlgRuntimeClass(code);
+}
+
+void CMTOutputKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kCount{"number_of_outputs", KeywordType::Int, "0",
+                                    "Number of outputs (as ZoSEKivListItemCount)", 0, "0 .. 100000"};
+    sink.Add(kCount);
 }

@@ -14,6 +14,7 @@ public:
     bool NameNewOutputs();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;

@@ -7,11 +7,11 @@ struct DensityFeedbackFields {
     using F = KivField<CMTDensityFeedbackKiv>;
     using K = CMTDensityFeedbackKiv;
     static inline const F kFields[] = {
-        F::Bool("include_density_feedback_on_HD", &K::m_includeFeedback, false),
-        F::DoubleAsFloat("density_of_sediment", &K::m_densityOfSediment, 2650.0),
-        F::DoubleAsFloat("base_in_viscosity_formula", &K::m_baseInViscosity, 1.0),
+        F::Bool("include_density_feedback_on_HD", &K::m_includeFeedback, false).Doc("Whether suspended sediment acts on the flow's density"),
+        F::DoubleAsFloat("density_of_sediment", &K::m_densityOfSediment, 2650.0).Unit(100017).Doc("Density of the sediment"),
+        F::DoubleAsFloat("base_in_viscosity_formula", &K::m_baseInViscosity, 1.0).Unit(100144).Doc("Base in the formula of the viscosity"),
         F::DoubleAsFloat("concentration_in_viscosity_formula", &K::m_concentrationInViscosity,
-                         1.0),
+                         1.0).Unit(100403).Doc("Concentration in the formula of the viscosity"),
     };
 };
 
@@ -40,3 +40,5 @@ const char* CMTDensityFeedbackKiv::GetDlgRuntimeClass(unsigned code) {
 }
 
 void CMTDensityFeedbackKiv::SetDefault() { DefaultFields(*this, DensityFeedbackFields::kFields); }
+
+void CMTDensityFeedbackKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, DensityFeedbackFields::kFields); }

@@ -18,6 +18,7 @@ public:
     void ConcentrationInViscosityFormula(double v) { m_concentrationInViscosity = v; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     // Offered only where the flow's density varies ("HDDensity" mode above 0).

@@ -7,8 +7,8 @@ struct DepositionFields {
     using F = KivField<CMTDepositionKiv>;
     using K = CMTDepositionKiv;
     static inline const F kFields[] = {
-        F::Int("concentration_profile", &K::m_concentrationProfile, 1),
-        F::Double("centroid_height", &K::m_centroidHeight, 0.3),
+        F::Int("concentration_profile", &K::m_concentrationProfile, 1).Choices("0 Rouse profile, 1 Teeter profile").Doc("Vertical profile of the concentration near the bed"),
+        F::Double("centroid_height", &K::m_centroidHeight, 0.3).Doc("Height of the concentration's centroid above the bed, relative to the depth"),
     };
 };
 
@@ -43,3 +43,5 @@ const char* CMTDepositionKiv::GetDlgRuntimeClass(unsigned code) {
 }
 
 void CMTDepositionKiv::SetDefault() { DefaultFields(*this, DepositionFields::kFields); }
+
+void CMTDepositionKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, DepositionFields::kFields); }

@@ -33,6 +33,7 @@ public:
     void CentroidHeight(double v) { m_centroidHeight = v; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return true; }

@@ -73,7 +73,7 @@ struct DispersionItemFields {
     using F = KivField<CMTDispersionItemKiv>;
     using K = CMTDispersionItemKiv;
     static inline const F kFields[] = {
-        F::Int("type", &K::m_type, CMTDispersionItemKiv::kScaledEddyViscosity),
+        F::Int("type", &K::m_type, CMTDispersionItemKiv::kScaledEddyViscosity).Choices("0 No dispersion, 1 Dispersion coefficient formulation, 2 Scaled eddy viscosity formulation").Doc("How the dispersion of the fraction is given"),
     };
 };
 
@@ -178,4 +178,13 @@ CMTDispersionKiv::CMTDispersionKiv(CZoSEKivBase* parent)
           new CMTDispersionListKiv(false, "Vertical Dispersion", "VERTICAL_DISPERSION", this)) {
     AddChild(m_horizontal);
     AddChild(m_vertical);
+}
+
+void CMTDispersionItemKiv::DescribeKeywords(KeywordSink& sink) {
+    DescribeFields(sink, DispersionItemFields::kFields);
+    UpdateFormatCode();
+    m_eddyViscosity->DescribeAt(sink, sink.Path() + "/SCALED_EDDY_VISCOSITY", "sigma", true,
+                                "item_number");
+    m_coefficient->DescribeAt(sink, sink.Path() + "/DISPERSION_COEFFICIENT", "constant_value",
+                              true, "item_number");
 }

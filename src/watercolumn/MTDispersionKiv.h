@@ -29,6 +29,7 @@ public:
     void UpdateValuesInUse();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     const char* GetDlgRuntimeClass(unsigned code) override;

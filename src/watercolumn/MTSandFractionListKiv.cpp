@@ -13,8 +13,8 @@ struct SandFractionItemFields {
     using F = KivField<CMTSandFractionItemKiv>;
     using K = CMTSandFractionItemKiv;
     static inline const F kFields[] = {
-        F::Bool("include_sand", &K::m_includeSand, true),
-        F::DoubleAsFloat("mean_settling_velocity", &K::m_meanSettlingVelocity, 0.001),
+        F::Bool("include_sand", &K::m_includeSand, true).Doc("Whether the fraction is sand"),
+        F::DoubleAsFloat("mean_settling_velocity", &K::m_meanSettlingVelocity, 0.001).Unit(100128).Doc("Mean settling velocity of the sand fraction"),
     };
 };
 
@@ -22,7 +22,7 @@ struct SandFractionListFields {
     using F = KivField<CMTSandFractionListKiv>;
     using K = CMTSandFractionListKiv;
     static inline const F kFields[] = {
-        F::Flag("sand_fraction_description", &K::m_includeSandFractions, false),
+        F::Flag("sand_fraction_description", &K::m_includeSandFractions, false).Choices("0 no sand fractions, 1 sand fractions").Doc("Whether fractions may be sand"),
     };
 };
 
@@ -84,3 +84,7 @@ void CMTSandFractionListKiv::SetDefault() { DefaultFields(*this, SandFractionLis
 CMTSandFractionListKiv* SandFractions(const CZoSEKivBase* node) {
     return GetImportant<CMTSandFractionListKiv>(node, kKey);
 }
+
+void CMTSandFractionItemKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, SandFractionItemFields::kFields); }
+
+void CMTSandFractionListKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, SandFractionListFields::kFields); }

@@ -18,6 +18,7 @@ public:
     void StoredMeanSettlingVelocity(double stored) { m_meanSettlingVelocity = stored; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     // Items are edited in the list's grid.
@@ -41,6 +42,7 @@ public:
     bool IsSand(int fraction) const;
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override { return GetItemCount() >= 1; }

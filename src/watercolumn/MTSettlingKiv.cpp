@@ -8,14 +8,14 @@ struct SettlingFields {
     using F = KivField<CMTSettlingKiv>;
     using K = CMTSettlingKiv;
     static inline const F kFields[] = {
-        F::Int("flocculation_description", &K::m_flocculation, 1),
-        F::Int("hindered_settling_description", &K::m_hinderedSettling, 0),
-        F::Double("rho_sediment", &K::m_rhoSediment, 2650.0),
-        F::Double("cfloc", &K::m_cfloc, 0.01),
-        F::Double("cgel", &K::m_cgel, 50.0),
-        F::Double("chinder", &K::m_chinder, 10.0),
-        F::Double("c1_salt", &K::m_c1Salt, 0.5),
-        F::Double("c2_salt", &K::m_c2Salt, -0.33),
+        F::Int("flocculation_description", &K::m_flocculation, 1).Choices("0 constant settling velocity, 1 flocculation").Doc("Whether settling includes flocculation"),
+        F::Int("hindered_settling_description", &K::m_hinderedSettling, 0).Choices("0 none, 1 Winterwerp, 2 Richardson and Zaki").Doc("Formulation of hindered settling"),
+        F::Double("rho_sediment", &K::m_rhoSediment, 2650.0).Unit(100017).Doc("Density of the sediment"),
+        F::Double("cfloc", &K::m_cfloc, 0.01).Unit(100403).Doc("Concentration above which flocculation sets in"),
+        F::Double("cgel", &K::m_cgel, 50.0).Unit(100403).Doc("Gelling point"),
+        F::Double("chinder", &K::m_chinder, 10.0).Unit(100403).Doc("Concentration above which settling is hindered"),
+        F::Double("c1_salt", &K::m_c1Salt, 0.5).Doc("First coefficient of the salinity's effect on settling"),
+        F::Double("c2_salt", &K::m_c2Salt, -0.33).Doc("Second coefficient of the salinity's effect on settling"),
     };
 };
 
@@ -23,8 +23,8 @@ struct SettlingItemFields {
     using F = KivField<CMTSettlingItemKiv>;
     using K = CMTSettlingItemKiv;
     static inline const F kFields[] = {
-        F::Double("gamma", &K::m_gamma, 1.0),
-        F::Double("wsn", &K::m_wsn, 1.0),
+        F::Double("gamma", &K::m_gamma, 1.0).Doc("Exponent gamma of the fraction's settling velocity"),
+        F::Double("wsn", &K::m_wsn, 1.0).Doc("Exponent n of the fraction's settling velocity"),
     };
 };
 
@@ -116,3 +116,7 @@ const char* CMTSettlingKiv::GetDlgRuntimeClass(unsigned code) {
 }
 
 void CMTSettlingKiv::SetDefault() { DefaultFields(*this, SettlingFields::kFields); }
+
+void CMTSettlingItemKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, SettlingItemFields::kFields); }
+
+void CMTSettlingKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, SettlingFields::kFields); }

@@ -23,6 +23,7 @@ public:
     void UpdateValuesInUse();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     // Sand fractions take no mud settling parameters.
@@ -68,6 +69,7 @@ public:
     CMTSettlingItemKiv* GetItemInUse(int row);  // 1-based, null outside
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     bool IsDlgUsedInSetup() override;

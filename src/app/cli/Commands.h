@@ -18,6 +18,8 @@ void AddSetupCommands(CLI::App& app, int& status);
 void AddDatafileCommands(CLI::App& app, int& status);
 // mesh info.
 void AddMeshCommands(CLI::App& app, int& status);
+// keywords.
+void AddKeywordCommands(CLI::App& app, int& status);
 
 // A subcommand whose help is the hand-written text, printed as it stands by --help and
 // after a usage error.

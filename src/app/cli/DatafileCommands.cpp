@@ -1,5 +1,6 @@
 // datafile info, datafile new: look into a data file, or make one.
 #include "Commands.h"
+#include "Json.h"
 
 #include "datafile/DataFile.h"
 #include "fem/UnitUtil.h"
@@ -20,7 +21,7 @@ namespace cli {
 namespace {
 
 const char* const kDatafileHelp =
-    "usage: mudsetup datafile info FILE [--header-only]\n"
+    "usage: mudsetup datafile info FILE [--header-only] [--json]\n"
     "       mudsetup datafile new KIND --item NAME:UNITTYPE[:UNIT] ... --start TIME --step SECONDS\n"
     "                             [--steps N] [LAYOUT] [--title TEXT] [--from CSV] -o FILE\n"
     "Inspects or makes a data file (.qrd0, .qrd1, .qrd2, .qrdu, .kx0, .kx2; info also .xyz).\n"
@@ -31,7 +32,8 @@ const char* const kInfoHelp =
     "their unit types and units; for a point file (.xyz) the number of points and their\n"
     "extent. The values are checked as well unless --header-only is given.\n"
     "Exit status: 0 a valid file, 2 a file that cannot be read or is not valid\n"
-    "(FILE:LINE:COLUMN: message on standard error).\n";
+    "(FILE:LINE:COLUMN: message on standard error).\n"
+    "--json prints one JSON document instead, errors included (docs/json.md).\n";
 const char* const kNewHelp =
     "usage: mudsetup datafile new KIND --item NAME:UNITTYPE[:UNIT] ... --start TIME --step SECONDS\n"
     "                             [--steps N] [LAYOUT] [--title TEXT] [--from CSV] -o FILE\n"
@@ -450,6 +452,81 @@ int Info(const std::string& file, bool headerOnly) {
     return FlushStdout() ? kExitOk : kExitError;
 }
 
+std::string QuantityName(long unitType) {
+    const QuantityInfo* q = CUnitUtil::FindQuantity(unitType);
+    return q ? q->name : "";
+}
+
+std::string JsonError(const datafile::Error& e) {
+    return JsonMessage("error", paramfile::Diagnostic{e.file, {e.line, e.column}, e.message});
+}
+
+std::string JsonNumber(double v) {
+    if (!std::isfinite(v))
+        return "null";
+    char buf[32];
+    return std::string(buf, std::to_chars(buf, buf + sizeof buf, v).ptr);
+}
+
+int InfoJson(const std::string& file, bool headerOnly) {
+    std::cout << "{\n  \"file\": " << JsonString(file) << ",\n";
+    auto fail = [](const datafile::Error& e) {
+        std::cout << "  \"messages\": " << JsonArray({JsonError(e)}, 2) << "\n}\n";
+        FlushStdout();
+        return kExitError;
+    };
+    if (datafile::KindFromExtension(file) == datafile::Kind::Points) {
+        const datafile::XyzResult r = datafile::ReadXyz(file);
+        if (r.error)
+            return fail(*r.error);
+        std::string extent = "null";
+        if (!r.points.empty()) {
+            extent.clear();
+            for (auto [axis, m] : {std::pair{"x", &datafile::XyzPoint::x}, std::pair{"y", &datafile::XyzPoint::y},
+                                   std::pair{"z", &datafile::XyzPoint::z}}) {
+                const auto [lo, hi] = std::minmax_element(r.points.begin(), r.points.end(),
+                                                          [m](const auto& a, const auto& b) { return a.*m < b.*m; });
+                extent += std::string(extent.empty() ? "{" : ", ") + "\"" + axis + "_min\": " +
+                          JsonNumber((*lo).*m) + ", \"" + axis + "_max\": " + JsonNumber((*hi).*m);
+            }
+            extent += "}";
+        }
+        const auto named = std::count_if(r.points.begin(), r.points.end(),
+                                         [](const auto& p) { return !p.name.empty(); });
+        std::cout << "  \"messages\": [],\n  \"kind\": \"xyz\",\n  \"points\": "
+                  << r.points.size() << ",\n  \"extent\": " << extent << ",\n  \"named\": " << named
+                  << "\n}\n";
+        return FlushStdout() ? kExitOk : kExitError;
+    }
+    datafile::Header h;
+    if (headerOnly) {
+        datafile::HeaderResult r = datafile::ReadHeader(file);
+        if (r.error)
+            return fail(*r.error);
+        h = *r.header;
+    } else {
+        const datafile::ValuesResult r = datafile::ReadValues(file, {}, &h);
+        if (r.error)
+            return fail(*r.error);
+    }
+    std::vector<std::string> items;
+    for (const datafile::Item& i : h.items)
+        items.push_back("{\"name\": " + JsonString(i.name) + ", \"unit_type\": " +
+                        std::to_string(i.unitType) + ", \"quantity\": " +
+                        JsonString(QuantityName(i.unitType)) + ", \"unit\": " +
+                        JsonString(i.unit) + "}");
+    std::cout << "  \"messages\": [],\n"
+              << "  \"kind\": " << JsonString(h.kindWord) << ",\n"
+              << "  \"kind_name\": " << JsonString(datafile::KindName(h.kind)) << ",\n"
+              << "  \"title\": " << JsonString(h.title) << ",\n"
+              << "  \"time\": {\"start\": " << JsonString(datafile::FormatDateTime(h.time.start))
+              << ", \"step\": " << JsonNumber(h.time.step) << ", \"steps\": " << h.time.steps
+              << "},\n"
+              << "  \"values\": " << JsonString(datafile::DescribeLayout(h)) << ",\n"
+              << "  \"items\": " << JsonArray(items, 2) << "\n}\n";
+    return FlushStdout() ? kExitOk : kExitError;
+}
+
 }  // namespace
 
 void AddDatafileCommands(CLI::App& app, int& status) {
@@ -459,12 +536,16 @@ void AddDatafileCommands(CLI::App& app, int& status) {
     struct InfoOptions {
         std::string file;
         bool headerOnly = false;
+        bool json = false;
     };
     auto info = std::make_shared<InfoOptions>();
     CLI::App* cmdInfo = AddCommand(*group, "info", kInfoHelp);
     cmdInfo->add_option("FILE", info->file)->required()->check(kNotEmpty);
     cmdInfo->add_flag("--header-only", info->headerOnly);
-    cmdInfo->callback([info, &status] { status = Info(info->file, info->headerOnly); });
+    cmdInfo->add_flag("--json", info->json);
+    cmdInfo->callback([info, &status] {
+        status = info->json ? InfoJson(info->file, info->headerOnly) : Info(info->file, info->headerOnly);
+    });
 
     auto opts = std::make_shared<NewOptions>();
     CLI::App* cmdNew = AddCommand(*group, "new", kNewHelp);

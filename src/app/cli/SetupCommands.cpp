@@ -1,5 +1,6 @@
 // new, validate, format, show: the commands on whole setups.
 #include "Commands.h"
+#include "Json.h"
 
 #include "core/MudTransportModuleKiv.h"
 #include "core/ParameterSelectionKiv.h"
@@ -21,8 +22,9 @@ const char* const kNewHelp =
     "Writes a new setup with every default: N fractions (1 to 8, default 1) and\n"
     "N bed layers (1 to 12, default 1). Without -o the setup goes to standard output.\n";
 const char* const kValidateHelp =
-    "usage: mudsetup validate FILE\n"
+    "usage: mudsetup validate FILE [--json]\n"
     "Validates the setup and prints one line per message, \"PATH: message\".\n"
+    "--json prints one JSON document of every message instead (docs/json.md).\n"
     "Exit status: 0 valid, 1 invalid, 2 unreadable or syntax error.\n"
     "Warnings on reading (content no node reads, values that cannot be used, counts\n"
     "that disagree) make the file invalid: exit 0 means the file holds what it says.\n";
@@ -33,9 +35,10 @@ const char* const kFormatHelp =
     "When saving would drop content that reading reported (unknown keywords or\n"
     "sections), nothing is written and the exit status is 1; --force writes anyway.\n";
 const char* const kShowHelp =
-    "usage: mudsetup show FILE\n"
+    "usage: mudsetup show FILE [--json]\n"
     "Prints the module's navigation tree, one node a line, indented two spaces a level;\n"
-    "nodes not used in the setup are marked \"(not used)\".\n";
+    "nodes not used in the setup are marked \"(not used)\".\n"
+    "--json prints one JSON document of the nodes instead (docs/json.md).\n";
 
 // A file argument that is empty would name the current folder or, for -o, the input itself
 // (an unset shell variable); it is a usage error, not a path.
@@ -98,6 +101,60 @@ int Validate(const std::string& file) {
     return ok && doc->Errors().empty() && warnings == 0 ? kExitOk : kExitInvalid;
 }
 
+// --json: everything goes into one document on standard output, reading's warnings and a
+// file that cannot be read included.
+struct JsonOpen {
+    std::unique_ptr<CSetupDocument> doc;
+    std::vector<std::string> messages;
+};
+
+JsonOpen OpenForJson(const std::string& path) {
+    CSetupDocument::OpenResult opened = CSetupDocument::Open(path);
+    JsonOpen r;
+    if (opened.error)
+        r.messages.push_back(JsonMessage("error", *opened.error));
+    for (const paramfile::Diagnostic& w : opened.warnings)
+        r.messages.push_back(JsonMessage("warning", w));
+    r.doc = std::move(opened.document);
+    return r;
+}
+
+int ValidateJson(const std::string& file) {
+    JsonOpen opened = OpenForJson(file);
+    bool valid = false;
+    if (opened.doc) {
+        const size_t warnings = opened.messages.size();
+        const int ok = opened.doc->ValidateAll();
+        for (const CZoSEKivGlobalBase::ErrorEntry& e : opened.doc->Errors())
+            opened.messages.push_back(JsonMessage("error", e.node, e.message));
+        valid = ok && opened.doc->Errors().empty() && warnings == 0;
+    }
+    std::cout << "{\n  \"file\": " << JsonString(file) << ",\n  \"valid\": "
+              << (valid ? "true" : "false") << ",\n  \"messages\": "
+              << JsonArray(opened.messages, 2) << "\n}\n";
+    if (!FlushStdout() || !opened.doc)
+        return kExitError;
+    return valid ? kExitOk : kExitInvalid;
+}
+
+int ShowJson(const std::string& file) {
+    JsonOpen opened = OpenForJson(file);
+    std::vector<std::string> nodes;
+    if (opened.doc)
+        WalkNavigationTree(opened.doc->Module(), 0, [&nodes](CZoSEKivBase* node, int depth) {
+            nodes.push_back("{\"depth\": " + std::to_string(depth) + ", \"title\": " +
+                            JsonString(node->GetTitle()) + ", \"path\": " +
+                            JsonString(NodePath(node)) + ", \"used\": " +
+                            (node->IsDlgUsedInSetup() ? "true" : "false") + "}");
+        });
+    std::cout << "{\n  \"file\": " << JsonString(file) << ",\n  \"messages\": "
+              << JsonArray(opened.messages, 2) << ",\n  \"nodes\": " << JsonArray(nodes, 2)
+              << "\n}\n";
+    if (!FlushStdout() || !opened.doc)
+        return kExitError;
+    return kExitOk;
+}
+
 int Format(const std::string& file, const std::string& output, bool force) {
     std::unique_ptr<CSetupDocument> doc = OpenOrReport(file);
     if (!doc)
@@ -146,6 +203,7 @@ void AddSetupCommands(CLI::App& app, int& status) {
         std::string file;
         std::string output;
         bool force = false;
+        bool json = false;
     };
     auto opts = std::make_shared<Options>();
 
@@ -159,7 +217,10 @@ void AddSetupCommands(CLI::App& app, int& status) {
 
     CLI::App* cmdValidate = AddCommand(app, "validate", kValidateHelp);
     cmdValidate->add_option("FILE", opts->file)->required()->check(kNotEmpty);
-    cmdValidate->callback([opts, &status] { status = Validate(opts->file); });
+    cmdValidate->add_flag("--json", opts->json);
+    cmdValidate->callback([opts, &status] {
+        status = opts->json ? ValidateJson(opts->file) : Validate(opts->file);
+    });
 
     CLI::App* cmdFormat = AddCommand(app, "format", kFormatHelp);
     cmdFormat->add_option("FILE", opts->file)->required()->check(kNotEmpty);
@@ -169,7 +230,10 @@ void AddSetupCommands(CLI::App& app, int& status) {
 
     CLI::App* cmdShow = AddCommand(app, "show", kShowHelp);
     cmdShow->add_option("FILE", opts->file)->required()->check(kNotEmpty);
-    cmdShow->callback([opts, &status] { status = Show(opts->file); });
+    cmdShow->add_flag("--json", opts->json);
+    cmdShow->callback([opts, &status] {
+        status = opts->json ? ShowJson(opts->file) : Show(opts->file);
+    });
 }
 
 }  // namespace cli

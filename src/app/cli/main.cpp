@@ -24,6 +24,8 @@ const char* const kUsage =
     "                                               .qrd2, .qrdu, .kx0, .kx2, .xyz)\n"
     "  mesh info FILE                               a mesh's counts, extent and open\n"
     "                                               boundaries (.2dm, UGRID .nc)\n"
+    "  keywords [--json | --markdown]               the reference of every section and\n"
+    "                                               keyword: type, default, unit, range\n"
     "\n"
     "A file that cannot be read or has a syntax error exits 2 with FILE:LINE:COLUMN.\n"
     "Every command answers --help.\n";
@@ -44,6 +46,7 @@ int main(int argc, char** argv) {
     cli::AddSetupCommands(app, status);
     cli::AddDatafileCommands(app, status);
     cli::AddMeshCommands(app, status);
+    cli::AddKeywordCommands(app, status);
     cli::AddCommand(app, "help", kUsage)->group("")->callback([] { std::cout << kUsage; });
     return cli::Run(app, argc, argv, status);
 }

@@ -19,16 +19,16 @@ struct BoundaryItemFields {
     using K = CBoundaryConditionsComponentItemKiv;
     // The file's keywords sit between the constant and the soft start.
     static inline const F kHead[] = {
-        F::Int("type", &K::m_type, 0),
-        F::Int("format", &K::m_format, 0),
-        F::Double("constant_value", &K::m_constant, 0.0),
+        F::Int("type", &K::m_type, 0).Doc("Kind of boundary value"),
+        F::Int("format", &K::m_format, 0).Choices("0 constant, 1 varying in time").Doc("Whether the boundary value is a constant or a time series"),
+        F::Double("constant_value", &K::m_constant, 0.0).Doc("Boundary value when it is constant"),
     };
     static inline const F kTail[] = {
-        F::Double("soft_start_time", &K::m_softTime, 0.0),
-        F::Double("soft_start_reference", &K::m_refSoft, 0.0),
-        F::Int("soft_start_type", &K::m_typeSoft, 0),
-        F::Int("time_interpolation", &K::m_typeTI, 0),
-        F::Int("space_interpolation", &K::m_typeSI, 0),
+        F::Double("soft_start_time", &K::m_softTime, 0.0).Unit(100290).Range(">= 0").Doc("Time over which the boundary value is brought in"),
+        F::Double("soft_start_reference", &K::m_refSoft, 0.0).Doc("Value the soft start begins from"),
+        F::Int("soft_start_type", &K::m_typeSoft, 0).Doc("Shape of the soft start"),
+        F::Int("time_interpolation", &K::m_typeTI, 0).Doc("Interpolation of the boundary value in time"),
+        F::Int("space_interpolation", &K::m_typeSI, 0).Doc("Interpolation of the boundary value along the boundary"),
     };
 };
 
@@ -154,4 +154,15 @@ void CBoundaryConditionsComponentItemKiv::SetDefault() {
     m_typeTI = m_defaults.typeTI;
     m_typeSI = m_defaults.typeSI;
     m_file = CBoundaryConditionsComponentItemFileKiv();
+}
+
+void CBoundaryConditionsComponentItemKiv::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kFile[] = {
+        {"file_name", KeywordType::FileName, "''", "Time series of the boundary value"},
+        {"item_numbers", KeywordType::IntList, "1", "Items of the data file to read"},
+        {"item_name", KeywordType::String, "\"\"", "Name of the data file's item"},
+    };
+    DescribeFields(sink, BoundaryItemFields::kHead);
+    sink.Add(kFile);
+    DescribeFields(sink, BoundaryItemFields::kTail);
 }

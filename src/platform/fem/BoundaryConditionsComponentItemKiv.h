@@ -58,6 +58,7 @@ public:
     static CString InterpolationName(int type, bool inSpace);
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     // Back to the defaults the module chose (RememberDefaults).

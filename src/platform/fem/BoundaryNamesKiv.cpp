@@ -12,8 +12,8 @@ struct BoundaryNameFields {
     using F = KivField<CBoundaryNameKiv>;
     using K = CBoundaryNameKiv;
     static inline const F kFields[] = {
-        F::String("name", &K::m_name, ""),
-        F::Int("code", &K::m_code, 2),
+        F::String("name", &K::m_name, "").Doc("Name of the open boundary"),
+        F::Int("code", &K::m_code, 2).Doc("Boundary code of the open boundary in the mesh"),
     };
 };
 
@@ -62,3 +62,5 @@ int CBoundaryNamesKiv::ValidateData() {
 CBoundaryNamesKiv* BoundaryNames(const CZoSEKivBase* node) {
     return GetImportant<CBoundaryNamesKiv>(node, kKey);
 }
+
+void CBoundaryNameKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, BoundaryNameFields::kFields); }

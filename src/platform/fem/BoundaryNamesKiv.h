@@ -22,6 +22,7 @@ public:
     void SetTitle(const CString& title) override { m_name = title; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
 

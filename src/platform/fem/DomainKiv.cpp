@@ -12,18 +12,18 @@ struct DomainFields {
     using F = KivField<CDomainKiv>;
     using K = CDomainKiv;
     static inline const F kFields[] = {
-        F::FileName("mesh_file", &K::m_meshFile, ""),
-        F::Double("x_min", &K::m_xMin, 0.0),
-        F::Double("x_max", &K::m_xMax, 0.0),
-        F::Double("y_min", &K::m_yMin, 0.0),
-        F::Double("y_max", &K::m_yMax, 0.0),
-        F::Double("z_min", &K::m_zMin, 0.0),
-        F::Double("z_max", &K::m_zMax, 0.0),
-        F::String("projection", &K::m_projection, "UTM-32"),
-        F::Flag("three_dimensional", &K::m_threeDimensional, false),
-        F::Int("vertical_kind", &K::m_verticalKind, 1),
-        F::Int("number_of_sigma_layers", &K::m_layers1, 10),
-        F::Int("number_of_z_layers", &K::m_layers2, 0),
+        F::FileName("mesh_file", &K::m_meshFile, "").Doc("Mesh file of the domain (.2dm or UGRID .nc)"),
+        F::Double("x_min", &K::m_xMin, 0.0).Unit(100183).Doc("Western edge of the domain"),
+        F::Double("x_max", &K::m_xMax, 0.0).Unit(100183).Doc("Eastern edge of the domain"),
+        F::Double("y_min", &K::m_yMin, 0.0).Unit(100183).Doc("Southern edge of the domain"),
+        F::Double("y_max", &K::m_yMax, 0.0).Unit(100183).Doc("Northern edge of the domain"),
+        F::Double("z_min", &K::m_zMin, 0.0).Unit(100280).Doc("Lowest bed level of the domain"),
+        F::Double("z_max", &K::m_zMax, 0.0).Unit(100280).Doc("Highest bed level of the domain"),
+        F::String("projection", &K::m_projection, "UTM-32").Doc("Map projection of the mesh"),
+        F::Flag("three_dimensional", &K::m_threeDimensional, false).Choices("0 two-dimensional, 1 three-dimensional").Doc("Whether the flow model is three-dimensional"),
+        F::Int("vertical_kind", &K::m_verticalKind, 1).Doc("Kind of vertical discretisation"),
+        F::Int("number_of_sigma_layers", &K::m_layers1, 10).Range("0 .. 100").Doc("Number of sigma layers"),
+        F::Int("number_of_z_layers", &K::m_layers2, 0).Range("0 .. 100").Doc("Number of z layers"),
     };
 };
 
@@ -251,3 +251,5 @@ void CDomainKiv::SetDefault() {
 }
 
 CDomainKiv* Domain(const CZoSEKivBase* node) { return GetImportant<CDomainKiv>(node, "Domain"); }
+
+void CDomainKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, DomainFields::kFields); }

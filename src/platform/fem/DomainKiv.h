@@ -70,6 +70,7 @@ public:
     CBoundaryNamesKiv* BoundaryNames() const { return m_boundaries; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override;

@@ -4,6 +4,7 @@
 #include "datafile/ZoFileSelector.h"
 #include "UnitUtil.h"
 #include "paramfile/Kiv.h"
+#include "setupeditor/Keywords.h"
 
 CString CFemInDataFile::ItemString() const {
     if (!m_itemName.empty())
@@ -176,4 +177,37 @@ void CFemInDataKiv::SetDefault() {
     m_format = 0;
     m_constant = m_default;
     m_file = CFemInDataFile();
+}
+
+void CFemInDataKiv::DescribeAt(KeywordSink& sink, const std::string& path,
+                               const char* constantKeyword, bool constantIsFloat,
+                               const char* itemKeyword) const {
+    const CString title = GetTitle().empty() ? CString("the value") : GetTitle();
+    auto entry = [&](const char* keyword, KeywordType type, std::string def, std::string text) {
+        KeywordEntry e;
+        e.path = path;
+        e.keyword = keyword;
+        e.type = type;
+        e.defaultValue = std::move(def);
+        e.description = std::move(text);
+        return e;
+    };
+    KeywordEntry format = entry("format", KeywordType::Int, "0", title + ": constant or from a data file");
+    for (int f : AllowedFormats())
+        format.choices += (format.choices.empty() ? "" : ", ") + std::to_string(f) + " " + FormatName(f);
+    sink.Add(std::move(format));
+    KeywordEntry constant =
+        entry(constantKeyword, constantIsFloat ? KeywordType::Float : KeywordType::Double,
+              constantIsFloat ? KeywordFloatText(static_cast<float>(m_default))
+                              : KeywordNumberText(m_default),
+              title + ": the constant");
+    constant.unitType = m_itemType > 0 ? m_itemType : 0;
+    sink.Add(std::move(constant));
+    sink.Add(entry("file_name", KeywordType::FileName, "''", title + ": data file"));
+    sink.Add(entry(itemKeyword, KeywordType::IntList, "1", title + ": items of the data file to read"));
+    sink.Add(entry("item_name", KeywordType::String, "\"\"", title + ": name of the data file's item"));
+}
+
+void CFemInDataKiv::DescribeKeywords(KeywordSink& sink) {
+    DescribeAt(sink, sink.Path(), "constant_value", false, "item_numbers");
 }

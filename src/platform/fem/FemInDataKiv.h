@@ -70,6 +70,10 @@ public:
     CString FormatText() const;
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
+    // The value's keywords in section path, for owners that write it under other names.
+    void DescribeAt(KeywordSink& sink, const std::string& path, const char* constantKeyword,
+                    bool constantIsFloat, const char* itemKeyword) const;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override;

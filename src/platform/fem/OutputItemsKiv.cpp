@@ -1,5 +1,6 @@
 #include "OutputItemsKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "paramfile/Kiv.h"
 
 bool COutputItemsKiv::GetBasicItem(int index, CString& label, CString& keyword, int& type,
@@ -33,5 +34,18 @@ void COutputItemsKiv::ReadData(void* h) {
         int value = item.selected ? 1 : 0;
         kivGetParam(h, item.keyword.c_str(), &value, 1, 1);
         item.selected = value == 1;
+    }
+}
+
+void COutputItemsKiv::DescribeKeywords(KeywordSink& sink) {
+    for (const Item& item : m_items) {
+        KeywordEntry e;
+        e.path = sink.Path();
+        e.keyword = item.keyword;
+        e.type = KeywordType::Int;
+        e.defaultValue = item.selected ? "1" : "0";
+        e.choices = "0 not written, 1 written";
+        e.description = "Whether the output writes " + item.label;
+        sink.Add(std::move(e));
     }
 }

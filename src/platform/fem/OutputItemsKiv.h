@@ -24,6 +24,7 @@ public:
     void SetBasicItemSelected(int index, bool selected);
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     // A missing keyword keeps the item's selection; keywords of no item are left alone.
     void ReadData(void* h) override;
 

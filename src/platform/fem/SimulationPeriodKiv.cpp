@@ -9,9 +9,9 @@ struct PeriodFields {
     using F = KivField<CSimulationPeriodKiv>;
     using K = CSimulationPeriodKiv;
     static inline const F kFields[] = {
-        F::String("start_time", &K::m_start, "2000-01-01 00:00:00"),
-        F::Int("number_of_time_steps", &K::m_timeSteps, 0),
-        F::Double("time_step_interval", &K::m_interval, 30.0),
+        F::String("start_time", &K::m_start, "2000-01-01 00:00:00").Doc("Start of the simulation (yyyy-MM-dd HH:mm:ss)"),
+        F::Int("number_of_time_steps", &K::m_timeSteps, 0).Range(">= 0").Doc("Number of time steps of the simulation"),
+        F::Double("time_step_interval", &K::m_interval, 30.0).Unit(100290).Range("> 0").Doc("Length of a time step"),
     };
 };
 
@@ -55,3 +55,5 @@ void CSimulationPeriodKiv::SetUpQrdValidation_SimulationPeriod(CZoFileSelector& 
 CSimulationPeriodKiv* SimulationPeriod(const CZoSEKivBase* node) {
     return GetImportant<CSimulationPeriodKiv>(node, "Period");
 }
+
+void CSimulationPeriodKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, PeriodFields::kFields); }

@@ -28,6 +28,7 @@ public:
     void SetUpQrdValidation_SimulationPeriod(CZoFileSelector& selector) const;
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override;

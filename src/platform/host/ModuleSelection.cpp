@@ -5,9 +5,9 @@
 struct ModuleSelectionFields {
     using F = KivField<CModuleSelection>;
     static inline const F kFields[] = {
-        F::Int("mud_transport_mode", &CModuleSelection::m_mudTransportMode, 2),
-        F::Int("spectral_wave_mode", &CModuleSelection::m_spectralWaveMode, 0),
-        F::Flag("decoupled_simulation", &CModuleSelection::m_decoupled, false),
+        F::Int("mud_transport_mode", &CModuleSelection::m_mudTransportMode, 2).Doc("How the mud-transport module runs (0 not in use)"),
+        F::Int("spectral_wave_mode", &CModuleSelection::m_spectralWaveMode, 0).Doc("How the spectral-wave module runs (0 not in use)"),
+        F::Flag("decoupled_simulation", &CModuleSelection::m_decoupled, false).Choices("0 coupled, 1 decoupled").Doc("Whether the simulation runs decoupled from the flow"),
     };
 };
 
@@ -26,3 +26,5 @@ void CModuleSelection::SetDefault() { DefaultFields(*this, ModuleSelectionFields
 CModuleSelection* ModuleSelection(const CZoSEKivBase* node) {
     return GetImportant<CModuleSelection>(node, "ModuleSelection");
 }
+
+void CModuleSelection::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, ModuleSelectionFields::kFields); }

@@ -18,6 +18,7 @@ public:
     void DecoupledSimulation(bool decoupled) { m_decoupled = decoupled; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     void SetDefault() override;
 

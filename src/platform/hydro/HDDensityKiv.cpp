@@ -1,5 +1,6 @@
 #include "HDDensityKiv.h"
 
+#include "setupeditor/Keywords.h"
 #include "paramfile/Kiv.h"
 
 CHDDensityKiv::CHDDensityKiv(CZoSEKivBase* parent)
@@ -29,4 +30,17 @@ int CHDDensityKiv::ValidateData() {
 
 CHDDensityKiv* HDDensity(const CZoSEKivBase* node) {
     return GetImportant<CHDDensityKiv>(node, "HDDensity");
+}
+
+void CHDDensityKiv::DescribeKeywords(KeywordSink& sink) {
+    KeywordEntry e;
+    e.path = sink.Path();
+    e.keyword = "density_mode";
+    e.type = KeywordType::Int;
+    e.defaultValue = std::to_string(m_mode);
+    const std::vector<CString>& texts = DensityModeTexts();
+    for (size_t i = 0; i < texts.size(); ++i)
+        e.choices += (i ? ", " : "") + std::to_string(i) + " " + texts[i];
+    e.description = "What the flow model's density depends on";
+    sink.Add(std::move(e));
 }

@@ -17,6 +17,7 @@ public:
     static const std::vector<CString>& DensityModeTexts();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override { m_mode = 0; }

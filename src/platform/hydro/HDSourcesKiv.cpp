@@ -12,10 +12,10 @@ struct HDSourceFields {
     using F = KivField<CHDSourceItemKiv>;
     using K = CHDSourceItemKiv;
     static inline const F kFields[] = {
-        F::String("name", &K::m_name, ""),
-        F::Flag("include", &K::m_include, true),
-        F::Double("x", &K::m_x, 0.0),
-        F::Double("y", &K::m_y, 0.0),
+        F::String("name", &K::m_name, "").Doc("Name of the hydrodynamic source"),
+        F::Flag("include", &K::m_include, true).Choices("0 excluded, 1 included").Doc("Whether the source takes part in the simulation"),
+        F::Double("x", &K::m_x, 0.0).Unit(100183).Doc("Easting of the source"),
+        F::Double("y", &K::m_y, 0.0).Unit(100183).Doc("Northing of the source"),
     };
 };
 
@@ -59,3 +59,5 @@ CHDSourcesKiv::~CHDSourcesKiv() { GetRoot()->UnregisterImportantNode(kKey); }
 CHDSourcesKiv* HDSources(const CZoSEKivBase* node) {
     return GetImportant<CHDSourcesKiv>(node, kKey);
 }
+
+void CHDSourceItemKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, HDSourceFields::kFields); }

@@ -24,6 +24,7 @@ public:
     bool IsDlgUsedInSetup() override { return m_include; }
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
 

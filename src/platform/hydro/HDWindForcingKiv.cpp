@@ -10,8 +10,8 @@ struct WindFields {
     using F = KivField<CHDWindForcingKiv>;
     using K = CHDWindForcingKiv;
     static inline const F kFields[] = {
-        F::Flag("include", &K::m_include, false),
-        F::Int("type", &K::m_type, 0),
+        F::Flag("include", &K::m_include, false).Choices("0 excluded, 1 included").Doc("Whether the flow model is forced by wind"),
+        F::Int("type", &K::m_type, 0).Doc("How the wind is given (constant, varying in time, ...)"),
     };
 };
 
@@ -44,3 +44,5 @@ int CHDWindForcingKiv::ValidateData() {
 CHDWindForcingKiv* WindForcing(const CZoSEKivBase* node) {
     return GetImportant<CHDWindForcingKiv>(node, kKey);
 }
+
+void CHDWindForcingKiv::DescribeKeywords(KeywordSink& sink) { DescribeFields(sink, WindFields::kFields); }

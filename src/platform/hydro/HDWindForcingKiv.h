@@ -19,6 +19,7 @@ public:
     static const std::vector<CString>& WindTypeTexts();
 
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     int ValidateData() override;
     void SetDefault() override;

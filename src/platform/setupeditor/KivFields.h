@@ -6,10 +6,15 @@
 //       KivField<CMyKiv>::Double("rho_sediment", &CMyKiv::m_rho, 2650.0),
 //   };
 //   WriteFields(h, *this, kFields); ReadFields(h, *this, kFields); DefaultFields(*this, kFields);
+//
+// The same table describes the keywords for the reference (DescribeFields): add the unit,
+// the range or choices and a line of text where the field is declared,
+//       F::Double("rho_sediment", &K::m_rho, 2650.0).Unit(100012).Range("> 0").Doc("...")
 #pragma once
 
 #include "common/Platform.h"
 #include "paramfile/Kiv.h"
+#include "setupeditor/Keywords.h"
 
 #include <cmath>
 #include <cstddef>
@@ -54,6 +59,31 @@ struct KivField {
     CString O::*stringMember = nullptr;
     double numericDefault = 0.0;
     const char* stringDefault = "";
+    long unitType = 0;
+    const char* range = "";
+    const char* choices = "";
+    const char* description = "";
+
+    KivField Unit(long type) const {
+        KivField f = *this;
+        f.unitType = type;
+        return f;
+    }
+    KivField Range(const char* text) const {
+        KivField f = *this;
+        f.range = text;
+        return f;
+    }
+    KivField Choices(const char* text) const {
+        KivField f = *this;
+        f.choices = text;
+        return f;
+    }
+    KivField Doc(const char* text) const {
+        KivField f = *this;
+        f.description = text;
+        return f;
+    }
 
     static KivField Int(const char* kw, int O::*m, int def) {
         KivField f{kw, Kind::Int};
@@ -165,5 +195,51 @@ void DefaultFields(O& o, const KivField<O> (&fields)[N]) {
         case K::String:
         case K::FileName: o.*f.stringMember = f.stringDefault; break;
         }
+    }
+}
+
+template <class O, size_t N>
+void DescribeFields(KeywordSink& sink, const KivField<O> (&fields)[N]) {
+    using K = typename KivField<O>::Kind;
+    for (const KivField<O>& f : fields) {
+        KeywordEntry e;
+        e.path = sink.Path();
+        e.keyword = f.keyword;
+        switch (f.kind) {
+        case K::Int:
+            e.type = KeywordType::Int;
+            e.defaultValue = std::to_string(static_cast<int>(f.numericDefault));
+            break;
+        case K::Double:
+            e.type = KeywordType::Double;
+            e.defaultValue = KeywordNumberText(f.numericDefault);
+            break;
+        case K::Float:
+        case K::DoubleAsFloat:
+            e.type = KeywordType::Float;
+            e.defaultValue = KeywordFloatText(ToFileFloat(f.numericDefault));
+            break;
+        case K::Bool:
+            e.type = KeywordType::Bool;
+            e.defaultValue = f.numericDefault != 0 ? "true" : "false";
+            break;
+        case K::Flag:
+            e.type = KeywordType::Flag;
+            e.defaultValue = f.numericDefault != 0 ? "1" : "0";
+            break;
+        case K::String:
+            e.type = KeywordType::String;
+            e.defaultValue = KeywordStringText(f.stringDefault);
+            break;
+        case K::FileName:
+            e.type = KeywordType::FileName;
+            e.defaultValue = KeywordFileNameText(f.stringDefault);
+            break;
+        }
+        e.unitType = f.unitType;
+        e.range = f.range;
+        e.choices = f.choices;
+        e.description = f.description;
+        sink.Add(std::move(e));
     }
 }

@@ -8,6 +8,7 @@
 #include <vector>
 
 class CZoSEKivGlobalBase;
+class KeywordSink;
 
 // Dialogs are asked for with this code; other codes are the framework's own.
 constexpr unsigned kDlgRuntimeClassRequest = 2555;
@@ -52,6 +53,9 @@ public:
     virtual void LoadSize(void* h);
     virtual void WriteData(void* h);
     virtual void ReadData(void* h);
+    // Declares every keyword WriteData (and SaveSize) may write, for the keyword reference.
+    virtual void DescribeKeywords(KeywordSink&) {}
+    virtual void DescribeSize(KeywordSink&) {}
 
     // Validation: 1 valid, 0 when messages were added.
     virtual int Validate();

@@ -4,6 +4,7 @@
 
 #include "ZoSEKivBase.h"
 #include "paramfile/Kiv.h"
+#include "setupeditor/Keywords.h"
 
 #include <algorithm>
 #include <memory>
@@ -203,6 +204,13 @@ public:
             m_items[hint - 1] == node)
             return hint;
         return -1;
+    }
+
+    void DescribeSize(KeywordSink& sink) override {
+        static const KeywordDecl kCount{"ZoSEKivListItemCount", KeywordType::Int, "0",
+                                        "Number of items in the list", 0, "0 .. 100000"};
+        if (!GetSectionNamePattern().empty())
+            sink.Add(kCount);
     }
 
     void SaveSize(void* h) override {

@@ -1,5 +1,6 @@
 #include "ZoSEQrdSelection.h"
 
+#include "setupeditor/Keywords.h"
 #include "paramfile/Kiv.h"
 
 #include <algorithm>
@@ -87,4 +88,12 @@ void ZoSEQrdSelection::SetDefault() {
     const int n = GetNoItems();
     m_items.clear();
     SetNoItems(n);
+}
+
+void ZoSEQrdSelection::DescribeKeywords(KeywordSink& sink) {
+    static const KeywordDecl kDecls[] = {
+        {"file_name", KeywordType::FileName, "''", "Data file"},
+        {"item_numbers", KeywordType::IntList, "", "Items of the data file to read"},
+    };
+    sink.Add(kDecls);
 }

@@ -42,6 +42,7 @@ public:
 
     // "file_name" and "item_numbers"; sections that keep the keywords elsewhere override.
     void WriteData(void* h) override;
+    void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
     // The file check; "File is not valid" when it fails.
     int ValidateData() override;
