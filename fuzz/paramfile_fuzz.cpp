@@ -46,6 +46,12 @@ void ReadEverything(const Section& root) {
             Check(s->FindKeyword(name, occurrence) == &k, "keyword not found by name", name);
             void* kw = kivKeywordByNameNum(h, name.c_str(), occurrence);
             Check(kw == &k, "keyword not found by occurrence", name);
+            // A value stands on its keyword's line, after it, and after the value before.
+            for (int p = 0, column = k.Pos().column; p < k.ParamCount(); ++p) {
+                const Position at = k.ParamPos(p);
+                Check(at.line == k.Pos().line && at.column > column, "value out of place", name);
+                column = at.column;
+            }
             for (int p = 0; p <= kivParamCount(kw) + 1; ++p) {
                 int iv = 0;
                 double dv = 0;
@@ -257,5 +263,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Check(WriteText(copy) == first, "a copied document writes differently", first);
 
     ReadEverything(r.document->Root());
+    // Every section, keyword and value has been read: nothing is left to report.
+    Check(UnreadEntries(r.document->Root(), "").empty(), "read content reported as unread",
+          first);
     return 0;
 }

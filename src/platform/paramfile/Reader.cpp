@@ -169,7 +169,14 @@ private:
     bool ReadFileName();
     bool ReadNumber();
     bool ReadWord();
-    void Push(const Param& p) {
+    void Push(Param p) {
+        const auto column = static_cast<std::size_t>(valueStart_ - lineStart_) + 1;
+        if (column < Document::Impl::kWideColumn) {
+            Access::SetColumn(p, static_cast<std::uint16_t>(column));
+        } else {
+            Access::SetColumn(p, Document::Impl::kWideColumn);
+            d_.wideColumns[static_cast<std::uint32_t>(d_.params.size())] = static_cast<int>(column);
+        }
         d_.params.push_back(p);
         ++Access::ParamCount(d_.keywords.back());
     }
@@ -195,6 +202,7 @@ private:
     const char* p_;
     const char* end_;
     const char* lineStart_;
+    const char* valueStart_ = nullptr; // where the value being read begins
     int line_ = 1;
     std::vector<Open> open_;
     // Entries of the open sections, innermost last; a section's run moves to the
@@ -426,6 +434,7 @@ bool Reader::ReadKeyword(const char* name, const char* nameEnd) {
 }
 
 bool Reader::ReadValue() {
+    valueStart_ = p_;
     const char c = *p_;
     if (c == '"')
         return ReadString();

@@ -43,7 +43,7 @@ public:
     // "file_name" and "item_numbers"; sections that keep the keywords elsewhere override.
     void WriteData(void* h) override;
     void ReadData(void* h) override;
-    // The file check; "File is not valid" when it fails.
+    // The file check; "File is not valid", with the reason, when it fails.
     int ValidateData() override;
     void SetDefault() override;
 
