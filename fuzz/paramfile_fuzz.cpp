@@ -30,13 +30,14 @@ void ReadEverything(const Section& root) {
         const Section* s = todo.back();
         todo.pop_back();
         void* h = const_cast<Section*>(s);
-        std::unordered_map<std::string, int> seen;
+        std::unordered_map<std::string, int> seen, seenSections;
         for (int i = 0; i < s->EntryCount(); ++i) {
             if (s->EntryIsSection(i)) {
-                todo.push_back(&s->SectionAt(i));
-                Check(kivSectionByNameNum(h, std::string(s->SectionAt(i).Name()).c_str(), 1) !=
-                          nullptr,
-                      "section not found by name", std::string(s->SectionAt(i).Name()));
+                const Section& sub = s->SectionAt(i);
+                const std::string name(sub.Name());
+                todo.push_back(&sub);
+                Check(kivSectionByNameNum(h, name.c_str(), ++seenSections[name]) == &sub,
+                      "section not found by occurrence", name);
                 continue;
             }
             const Keyword& k = s->KeywordAt(i);
