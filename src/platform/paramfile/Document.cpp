@@ -184,6 +184,8 @@ std::size_t Document::Impl::MemoryBytes() const {
     n += TableBytes(params.capacity() * sizeof(Param));
     n += TableBytes(entries.capacity() * sizeof(std::uint32_t));
     n += names.Bytes() + text.Bytes();
+    n += wideColumns.size() * (sizeof(std::pair<const std::uint32_t, int>) + 2 * sizeof(void*));
+    n += foundKeywords.capacity() * sizeof(std::uint32_t) + foundSections.capacity();
     for (const Diagnostic& w : warnings)
         n += sizeof w + w.file.capacity() + w.message.capacity();
     return n;
@@ -386,14 +388,20 @@ Position Keyword::ParamPos(int index) const {
     if (!doc_ || index < 0 || static_cast<std::uint32_t>(index) >= count_)
         return pos_;
     const Document::Impl& d = doc_->impl();
-    const std::uint32_t at = first_ + static_cast<std::uint32_t>(index);
-    const std::uint16_t column = Access::ColumnOf(d.params[at]);
-    if (column == 0)
-        return pos_;
-    if (column != Document::Impl::kWideColumn)
-        return {pos_.line, column};
-    const auto it = d.wideColumns.find(at);
-    return it == d.wideColumns.end() ? pos_ : Position{pos_.line, it->second};
+    // Back along the steps to the keyword, or to a value whose column is kept whole.
+    int column = 0;
+    for (std::uint32_t at = first_ + static_cast<std::uint32_t>(index);; --at) {
+        const std::uint16_t step = Access::ColumnOf(d.params[at]);
+        if (step == 0)
+            return pos_; // built, not read
+        if (step == Document::Impl::kWideColumn) {
+            const auto it = d.wideColumns.find(at);
+            return it == d.wideColumns.end() ? pos_ : Position{pos_.line, it->second + column};
+        }
+        column += step;
+        if (at == first_)
+            return {pos_.line, pos_.column + column};
+    }
 }
 
 std::string_view Section::Name() const {

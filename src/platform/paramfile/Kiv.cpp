@@ -152,9 +152,11 @@ std::string KeptText(const std::string* v) {
 }
 
 // "count =" where a value is read: the target keeps what it holds, which is said.
+bool HasNoValue(const Found& f) {
+    return f.keyword && f.keyword->ParamCount() == 0;
+}
 void WarnNoValue(const Found& f, const std::string& kept) {
-    if (f.keyword && f.keyword->ParamCount() == 0)
-        Warn(f, paramfile::Cat("'", f.keyword->Name(), "' has no value; kept ", kept));
+    Warn(f, paramfile::Cat("'", f.keyword->Name(), "' has no value; kept ", kept));
 }
 
 template <class T> void Get(void* h, const char* keyword, T* value, int occurrence, int index) {
@@ -163,7 +165,7 @@ template <class T> void Get(void* h, const char* keyword, T* value, int occurren
     const Found f = Lookup(h, keyword, occurrence, index);
     if (f.param)
         Read(f, value);
-    else
+    else if (HasNoValue(f))
         WarnNoValue(f, KeptText(value));
 }
 
@@ -361,7 +363,7 @@ void kivGetParamFilename(void* h, const char* keyword, std::string* value, int o
     const Found f = Lookup(h, keyword, occurrence, index);
     if (f.param)
         ReadFileName(f, value);
-    else
+    else if (HasNoValue(f))
         WarnNoValue(f, paramfile::Cat("'", *value, "'"));
 }
 

@@ -67,8 +67,8 @@ private:
     std::uint32_t aux_ = 0;
     ParamType type_ = ParamType::Integer;
     std::uint8_t flags_ = 0;
-    // Column in the text (on its keyword's line); 0 where built in memory, kWideColumn
-    // where the document keeps it aside.
+    // Columns from the value before (the first from its keyword); 0 where built in memory.
+    // A step too long for 16 bits is kept aside by the document.
     std::uint16_t column_ = 0;
 };
 
@@ -82,7 +82,7 @@ public:
     // True once a look-up by name (FindKeyword) has found this keyword.
     bool WasFound() const;
     // Where a parameter (0-based) stands: its line and column when read from text, else
-    // the keyword's position.
+    // the keyword's position. Counted back over the values before it.
     Position ParamPos(int index) const;
 
 private:

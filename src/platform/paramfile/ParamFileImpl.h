@@ -133,7 +133,9 @@ struct Document::Impl {
         return at < foundKeywords.size() && foundKeywords[at] > 0 ? foundKeywords[at] - 1 : 0;
     }
 
-    // Columns that do not fit a parameter's 16 bits, by parameter index.
+    // Where a value follows the one before by more than 16 bits of columns (a string of
+    // 64 kB), its column itself, by parameter index. Steps keep this map as small as such
+    // values are rare, however long a line.
     static constexpr std::uint16_t kWideColumn = 0xFFFF;
     std::unordered_map<std::uint32_t, int> wideColumns;
 
