@@ -1,8 +1,9 @@
 # Every target does its own set-up: missing packages are installed, the build is configured.
-.PHONY: all deps build test test-asan run bench fuzz fuzz-ci format clean
+.PHONY: all deps build test test-asan install package run bench fuzz fuzz-ci format clean
 
 JOBS ?= $(shell nproc)
 EXAMPLE ?= examples/estuary.setup
+PREFIX ?= /usr/local
 
 all: build
 
@@ -15,15 +16,23 @@ build/default/build.ninja: | deps
 build: build/default/build.ninja
 	cmake --build --preset default -j $(JOBS)
 
+# One process per test, as many at once as there are cores.
 test: build
-	ctest --preset default
+	ctest --preset default -j $(JOBS)
 
 build/asan/build.ninja: | deps
 	cmake --preset asan
 
 test-asan: build/asan/build.ninja
 	cmake --build --preset asan -j $(JOBS)
-	ctest --preset asan
+	ctest --preset asan -j $(JOBS)
+
+install: build
+	cmake --install build/default --prefix $(PREFIX)
+
+# A .deb of the default build (stripped), in build/default.
+package: build
+	cd build/default && cpack -G DEB
 
 run: build
 	@if [ -x build/default/mudsetup-editor ] && [ -z "$$DISPLAY$$WAYLAND_DISPLAY$$QT_QPA_PLATFORM" ]; then \

@@ -84,7 +84,7 @@ private:
             // Picked one by one: argument order would differ between compilers.
             const char* dir = Pick(0, 1) ? "C:\\Projects\\estuary\\run_" : "../results/run_";
             const std::string run = std::to_string(Pick(1, 99));
-            b_.AddFileName(Join(dir, run, "/", names_[Pick(0, 299)], ".dfsu"));
+            b_.AddFileName(Join(dir, run, "/", names_[Pick(0, 299)], ".qrdu"));
         } else {
             b_.AddBool(Pick(0, 1));
         }

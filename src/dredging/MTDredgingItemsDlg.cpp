@@ -26,7 +26,8 @@ IMPLEMENT_DYNCREATE_DLG(CMTDredgingItemsDlg)
 
 namespace {
 constexpr long kMassGroup = 100076;
-const char* const kSpillTexts[] = {
+constexpr int kSpillTypes = 4;
+const char* const kSpillTexts[kSpillTypes] = {
     "Spill in the bottom layer", "Spill in the top layer",
     "Spill uniformed in the bottom and the top layer",
     "Spill uniformed distributed in the water column"};
@@ -66,7 +67,7 @@ CMTDredgingItemsDlg::CMTDredgingItemsDlg(QWidget* parent)
     m_select->setToolTip("Choose the time series and its items x, y, rate of dredged mass and spill");
     m_view->setToolTip("Show the time series");
 
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < kSpillTypes; ++i) {
         m_spill->addItem(kSpillTexts[i], i + 1);
         m_items[static_cast<std::size_t>(i)] = new QLineEdit(this);
         m_items[static_cast<std::size_t>(i)]->setObjectName(QString("item%1").arg(i + 1));
@@ -183,9 +184,11 @@ void CMTDredgingItemsDlg::SetData() {
     const QSignalBlocker b1(m_spill), b2(m_updateDredger), b3(m_projection);
     ShowItems();
     m_updateDredger->setChecked(d->UpdateDredger());
+    // A type read from a file that no entry stands for is shown as it is, until one is chosen.
+    while (m_spill->count() > kSpillTypes)
+        m_spill->removeItem(m_spill->count() - 1);
     int index = m_spill->findData(d->Type());
     if (index < 0) {
-        // A type read from a file that no entry stands for is shown as it is.
         m_spill->addItem(QString("Unknown type of spilling %1").arg(d->Type()), d->Type());
         index = m_spill->count() - 1;
     }
@@ -200,8 +203,11 @@ void CMTDredgingItemsDlg::SetData() {
 
     const CDomainKiv* domain = Domain(d);
     const bool threeD = domain && domain->ThreeD();
-    m_spill->setEnabled(threeD);
-    m_spillLabel->setEnabled(threeD);
+    // The type matters only in three dimensions, but one the engine does not know makes the
+    // dredger invalid anywhere, so it can be mended here in two dimensions as well.
+    const bool known = index < kSpillTypes;
+    m_spill->setEnabled(threeD || !known);
+    m_spillLabel->setEnabled(threeD || !known);
     m_initialMass->setEnabled(d->UpdateDredger());
     m_maximumMass->setEnabled(d->UpdateDredger());
 }

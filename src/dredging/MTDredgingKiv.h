@@ -19,6 +19,9 @@ public:
     void SetDefault() override { m_updateBed = true; }
     const char* GetDlgRuntimeClass(unsigned code) override;
 
+protected:
+    const char* CountKeyword() const override { return "number_of_dredgers"; }
+
 private:
     bool m_updateBed = true;
 };

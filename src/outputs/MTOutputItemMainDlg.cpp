@@ -316,7 +316,8 @@ void CMTOutputItemMainDlg::OnBrowse() {
     if (!o)
         return;
     const QString start = o->FileName().empty() ? QString() : Q(o->AbsolutePath(o->FileName()));
-    const QString chosen = ZoGetSaveFileName(this, "Select Output File Name", start, FileFilter());
+    const QString chosen = ZoGetSaveFileName(this, "Select Output File Name", start, FileFilter(),
+                                             QString(CMTOutputItemMainKiv::ExtensionOfFormat(o->Format())).mid(1));
     if (chosen.isEmpty())
         return;
     // Kept relative to the setup where it lies beside it, as data files are.

@@ -10,7 +10,9 @@
 #include "fem/SimulationPeriodKiv.h"
 #include "paramfile/Kiv.h"
 #include "projection/ZoMapProjection.h"
+#include "paramfile/ParamFile.h"
 #include "setupeditor/MessageTable.h"
+#include "setupeditor/MissingSections.h"
 
 #include <algorithm>
 #include <cctype>
@@ -19,28 +21,34 @@
 
 namespace {
 
-// Reads a count of points, refusing what no output can hold; false when the count is
-// missing or refused (the caller keeps what it has).
-bool ReadPointCount(void* h, int& count) {
-    void* keyword = kivKeywordByNameNum(h, "number_of_points", 1);
-    if (!keyword || kivParamCount(keyword) == 0)
-        return false;
-    int n = -1;
+// The count of points or corners. One that is missing, empty or refused reads as 0, so that
+// sections beyond it are reported as unread rather than read on a guess.
+int ReadPointCount(void* h) {
+    int n = 0;
     kivGetParam(h, "number_of_points", &n, 1, 1);
     if (n < 0 || n > kMaxOutputPoints) {
         kivWarn(h, "number_of_points",
-                FormatString("number_of_points = %d is not between 0 and %d; the points are kept",
-                             n, kMaxOutputPoints));
-        return false;
+                FormatString("number_of_points = %d is not between 0 and %d; read as 0", n,
+                             kMaxOutputPoints));
+        return 0;
     }
-    count = n;
-    return true;
+    return n;
 }
 
-void WarnMissingPoint(void* h, int i, int count) {
-    kivWarn(h, "number_of_points",
-            FormatString("POINT_%d is missing (number_of_points = %d); the point is left out", i,
-                         count));
+// The numbered POINT_n sections of h up to count, in order; the missing ones reported once.
+std::vector<void*> PointSections(void* h, int count) {
+    const std::vector<int> present = NumberedSections(h, "POINT_%d", count);
+    std::vector<void*> sections;
+    sections.reserve(present.size());
+    for (int i : present)
+        sections.push_back(kivSectionByNameNum(h, FormatString("POINT_%d", i).c_str(), 1));
+    const MissingNumbers missing = FindMissingNumbers(present, count);
+    std::vector<CString> names;
+    for (int i : missing.first)
+        names.push_back(FormatString("POINT_%d", i));
+    WarnMissingSections(h, "number_of_points", count, missing.count, names,
+                        "those points are left out");
+    return sections;
 }
 
 int Truncated(double z) {
@@ -225,20 +233,11 @@ void CMTOutputItemMainKiv::ReadData(void* h) {
 }
 
 void CMTOutputItemMainKiv::ReadPoints(void* h) {
-    int count = 0;
-    if (!ReadPointCount(h, count))
-        return;
+    const int count = ReadPointCount(h);
     m_points.clear();
-    m_points.reserve(static_cast<size_t>(count));
-    for (int i = 1; i <= count; ++i) {
-        const CString name = FormatString("POINT_%d", i);
-        void* s = kivSectionByNameNum(h, name.c_str(), 1);
-        if (!s) {
-            WarnMissingPoint(h, i, count);
-            continue;
-        }
+    for (void* s : PointSections(h, count)) {
         MTOutputPoint p;
-        p.name = name;
+        p.name = CString(static_cast<const paramfile::Section*>(s)->Name());
         kivGetParam(s, "name", &p.name, 1, 1);
         kivGetParam(s, "x", &p.x, 1, 1);
         kivGetParam(s, "y", &p.y, 1, 1);
@@ -249,38 +248,25 @@ void CMTOutputItemMainKiv::ReadPoints(void* h) {
 }
 
 void CMTOutputItemMainKiv::ReadArea(void* area) {
-    const bool hasCount = kivKeywordByNameNum(area, "number_of_points", 1) != nullptr;
-    int count = 0;
-    const bool counted = ReadPointCount(area, count);
-    if (counted && count > 0) {
-        m_polygon.clear();
-        m_polygon.reserve(static_cast<size_t>(count));
-        for (int i = 1; i <= count; ++i) {
-            void* s = kivSectionByNameNum(area, FormatString("POINT_%d", i).c_str(), 1);
-            if (!s) {
-                WarnMissingPoint(area, i, count);
-                continue;
-            }
+    const int count = ReadPointCount(area);
+    m_polygon.clear();
+    if (count > 0) {
+        for (void* s : PointSections(area, count)) {
             MTOutputCorner c;
             kivGetParam(s, "x", &c.x, 1, 1);
             kivGetParam(s, "y", &c.y, 1, 1);
             m_polygon.push_back(c);
         }
-    } else if (counted || !hasCount) {
-        // The older form gives a rectangle by its bounds. Without them an area that counts no
-        // corners is empty (validation says so), and one without a count keeps its corners.
-        const bool bounds = kivKeywordByNameNum(area, "x_min", 1) || kivKeywordByNameNum(area, "x_max", 1) ||
-                            kivKeywordByNameNum(area, "y_min", 1) || kivKeywordByNameNum(area, "y_max", 1);
-        if (bounds) {
-            double xMin = 0, xMax = 0, yMin = 0, yMax = 0;
-            kivGetParam(area, "x_min", &xMin, 1, 1);
-            kivGetParam(area, "x_max", &xMax, 1, 1);
-            kivGetParam(area, "y_min", &yMin, 1, 1);
-            kivGetParam(area, "y_max", &yMax, 1, 1);
-            m_polygon = {{xMin, yMin}, {xMin, yMax}, {xMax, yMax}, {xMax, yMin}};
-        } else if (counted) {
-            m_polygon.clear();
-        }
+    } else if (kivKeywordByNameNum(area, "x_min", 1) || kivKeywordByNameNum(area, "x_max", 1) ||
+               kivKeywordByNameNum(area, "y_min", 1) || kivKeywordByNameNum(area, "y_max", 1)) {
+        // The older form gives a rectangle by its bounds. Without them an area of no corners
+        // is empty (validation says so) rather than four corners at the origin.
+        double xMin = 0, xMax = 0, yMin = 0, yMax = 0;
+        kivGetParam(area, "x_min", &xMin, 1, 1);
+        kivGetParam(area, "x_max", &xMax, 1, 1);
+        kivGetParam(area, "y_min", &yMin, 1, 1);
+        kivGetParam(area, "y_max", &yMax, 1, 1);
+        m_polygon = {{xMin, yMin}, {xMin, yMax}, {xMax, yMax}, {xMax, yMin}};
     }
     kivGetParam(area, "layer_min", &m_layerMin, 1, 1);
     kivGetParam(area, "layer_max", &m_layerMax, 1, 1);
@@ -419,12 +405,12 @@ void CMTOutputItemMainKiv::CoordListToGeometry() {
 void CMTOutputItemMainKiv::Notify(CFemNotifier* notifier, ENotifyMessage message) {
     const CDomainKiv* domain = Domain(this);
     if (message == CDomainKiv::kThreeDChanged && domain && !domain->ThreeD()) {
-        // Only 3D outputs lose their kind; mass budgets and discharges keep theirs.
-        if (m_type == kType3D) {
+        // Only 3D outputs lose their kind; mass budgets and discharges keep theirs. No
+        // output keeps a volume in two dimensions.
+        if (m_type == kType3D)
             m_type = kType2D;
-            if (m_format == 3)
-                m_format = 2;
-        }
+        if (m_format == 3)
+            m_format = 2;
     } else if (message == CDomainKiv::kLayersChanged && domain) {
         m_layerMax = domain->LayerTotNum();
     }

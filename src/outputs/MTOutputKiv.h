@@ -17,4 +17,7 @@ public:
     void ReadData(void* h) override;
     int ValidateData() override { return 1; }
     const char* GetDlgRuntimeClass(unsigned code) override;
+
+protected:
+    const char* CountKeyword() const override { return "number_of_outputs"; }
 };

@@ -216,8 +216,12 @@ TEST(InitialConditions, ADistributionCountOtherThanTheFractionsIsReportedAndNotT
         "  BED_DISTRIBUTION_LAYER_2 {\n   ZoSEKivListItemCount = 1\n  }\n }\n";
     CSetupDocument::OpenResult r = CSetupDocument::FromText(ModuleText(2, 2, body), "t.setup");
     ASSERT_TRUE(r.document);
-    // The fraction beyond is reported as content no section reads.
-    ASSERT_EQ(r.warnings.size(), 3u) << ::testing::PrintToString(WarningTexts(r));
+    // The fraction beyond is reported as content no section reads, the fractions a layer
+    // lacks once for the layer.
+    ASSERT_EQ(r.warnings.size(), 4u) << ::testing::PrintToString(WarningTexts(r));
+    EXPECT_EQ(r.warnings[3].message,
+              "2 of 2 sections are missing (BED_DISTRIBUTION_FRACTION_1, "
+              "BED_DISTRIBUTION_FRACTION_2); those items take their defaults");
     EXPECT_EQ(r.warnings[1].message,
               "unknown section 'BED_DISTRIBUTION_FRACTION_5' in "
               "MUD_TRANSPORT_MODULE/INITIAL_CONDITIONS/BED_DISTRIBUTION_LAYER_1: not read, "

@@ -6,6 +6,9 @@
 
 namespace fs = std::filesystem;
 
+#include <fstream>
+#include <sstream>
+
 using namespace testsupport;
 using namespace condtest;
 
@@ -175,8 +178,10 @@ TEST(BoundaryConditions, CountsInTheFileThatDisagreeAreReportedAndTheHostIsFollo
               (std::vector<std::string>{
                   "ZoSEKivListItemCount = 5, but the setup has 2 boundaries; the list follows "
                   "them",
+                  "1 of 2 sections is missing (BOUNDARY_2); those items take their defaults",
                   "ZoSEKivListItemCount = 4, but the setup has 2 fractions; the list follows "
                   "them",
+                  "1 of 2 sections is missing (SSC_FRACTION_1); those items take their defaults",
                   // What lies beyond the counts is reported as content no section reads.
                   "unknown section 'SSC_FRACTION_4' in "
                   "MUD_TRANSPORT_MODULE/BOUNDARY_CONDITIONS/BOUNDARY_1: not read, dropped on saving",
@@ -200,23 +205,41 @@ TEST(BoundaryConditions, ValidationOfValuesNamesTheBoundaryAsItIsNow) {
         double constant;
         const char* file;
         double softTime;
+        std::vector<int> items;
+        int softType;
         const char* message;  // null: valid
     };
     const Case cases[] = {
-        {"zero gradient ignores its constant", 2, 0, -1.0, "", 0.0, nullptr},
-        {"land", 0, 0, 0.0, "", 0.0, nullptr},
-        {"specified constant", 1, 0, 0.02, "", 0.0, nullptr},
-        {"negative concentration", 1, 0, -0.02, "", 0.0,
+        {"zero gradient ignores its constant", 2, 0, -1.0, "", 0.0, {1}, 2, nullptr},
+        {"land", 0, 0, 0.0, "", 0.0, {1}, 2, nullptr},
+        {"zero gradient ignores its soft start", 2, 0, 0.0, "", -1.0, {1}, 7, nullptr},
+        {"specified constant", 1, 0, 0.02, "", 0.0, {1}, 2, nullptr},
+        {"negative concentration", 1, 0, -0.02, "", 0.0, {1}, 2,
          "Constant value must be larger than or equal to 0.0"},
-        {"time series without a file", 1, 1, 0.0, "", 0.0,
+        {"time series without a file", 1, 1, 0.0, "", 0.0, {1}, 2,
          "No data file is given for the boundary values"},
-        {"time series with a file that is not there", 1, 1, 0.0, "ssc.qrd0", 0.0,
+        {"time series with a file that is not there", 1, 1, 0.0, "ssc.qrd0", 0.0, {1}, 2,
          "File is not valid"},
-        {"unknown format", 1, 7, 0.0, "", 0.0, "Format 7 is not known"},
-        {"unknown type", 5, 0, 0.0, "", 0.0, "Boundary type 5 is not known"},
-        {"negative soft start", 1, 0, 0.0, "", -10.0,
+        {"no item chosen", 1, 3, 0.0, "ssc.qrd0", 0.0, {}, 2,
+         "No item of the data file is chosen for the boundary values"},
+        {"item number below 1", 1, 2, 0.0, "ssc.qrd0", 0.0, {2, 0}, 2,
+         "Item number 0 of the data file is not valid"},
+        {"unknown format", 1, 7, 0.0, "", 0.0, {1}, 2, "Format 7 is not known"},
+        {"unknown type", 5, 0, 0.0, "", 0.0, {1}, 2, "Boundary type 5 is not known"},
+        {"negative soft start", 1, 0, 0.0, "", -10.0, {1}, 2,
          "The soft-start interval must not be negative"},
+        {"unknown soft-start type", 1, 0, 0.0, "", 0.0, {1}, 3, "Values out of range"},
     };
+    // docs/conditions.md states every check, with N for the number in the message.
+    // Words joined by single spaces, a number standing alone as N.
+    auto words = [](std::istream&& in) {
+        std::string out, word;
+        while (in >> word)
+            out += (out.empty() ? "" : " ") +
+                   (word.find_first_not_of("-0123456789") == std::string::npos ? std::string("N") : word);
+        return out;
+    };
+    const std::string documented = words(std::ifstream(MUD_SOURCE_DIR "/docs/conditions.md"));
     for (const Case& c : cases) {
         auto doc = NewSetup(1, 1, 2);
         CMTBoundaryConditionsComponentItemKiv* item = Conditions(*doc)->GetItem(2)->GetItem(1);
@@ -224,7 +247,9 @@ TEST(BoundaryConditions, ValidationOfValuesNamesTheBoundaryAsItIsNow) {
         item->Format(c.format);
         item->Constant(c.constant);
         item->QrdData()->FileName(c.file);
+        item->QrdData()->ItemNumbers(c.items);
         item->SoftTime(c.softTime);
+        item->TypeSoft(c.softType);
         // A boundary inserted ahead since the last save: the message names the boundary's
         // place now.
         doc->GetBoundaryNames()->Insert(1, 1);
@@ -235,6 +260,10 @@ TEST(BoundaryConditions, ValidationOfValuesNamesTheBoundaryAsItIsNow) {
                 std::string("MUD_TRANSPORT_MODULE/BOUNDARY_CONDITIONS/BOUNDARY_3/SSC_FRACTION_1: ") +
                 c.message);
         EXPECT_EQ(Messages(*doc), expected) << c.what;
+        if (c.message) {
+            const std::string general = words(std::istringstream(c.message));
+            EXPECT_NE(documented.find('"' + general + '"'), std::string::npos) << general;
+        }
     }
 }
 

@@ -16,6 +16,7 @@
 #include "widgets/ZoNumberEdit.h"
 #include "widgets/ZoSEGridToolbar.h"
 
+#include <QAbstractItemView>
 #include <QAction>
 #include <QCheckBox>
 #include <QComboBox>
@@ -217,6 +218,23 @@ TEST_F(DredgerPage, SpillPlacementOnlyInAThreeDimensionalDomain) {
     page->SetData();
     EXPECT_EQ(page->SpillBox()->currentText(), "Unknown type of spilling 9");
     EXPECT_EQ(dredger->Type(), 9);
+
+    // It makes the dredger invalid in two dimensions too, so it can be mended there.
+    Domain(doc.Module())->ThreeD(false);
+    page->SetData();
+    EXPECT_TRUE(page->SpillBox()->isEnabled());
+    EXPECT_TRUE(page->SpillLabel()->isEnabled());
+    EXPECT_EQ(dredger->ValidateData(), 0);
+    // One pick in the list's popup; the choice greys again once the type is known.
+    QComboBox* box = page->SpillBox();
+    box->showPopup();
+    QAbstractItemView* view = box->view();
+    const QModelIndex first = view->model()->index(0, 0);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->visualRect(first).center());
+    EXPECT_EQ(dredger->Type(), 1);
+    page->SetData();
+    EXPECT_EQ(page->SpillBox()->count(), 4);
+    EXPECT_FALSE(page->SpillBox()->isEnabled());
 }
 
 TEST_F(DredgerPage, MassesAreEditableOnlyWhileTheDredgerIsUpdated) {

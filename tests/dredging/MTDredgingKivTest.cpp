@@ -220,8 +220,11 @@ TEST(MTDredgingKiv, TheNumberOfDredgersIsBoundedAndAMissingOneKeepsTheCount) {
         ASSERT_TRUE(opened.document);
         EXPECT_EQ(Dredging(*opened.document)->GetItemCount(), c.count);
         std::vector<std::string> w = WarningTexts(opened);
-        // Dredgers without a section of their own report their missing weights.
-        std::erase_if(w, [](const std::string& m) { return m.find("weights_fraction") != std::string::npos; });
+        // Dredgers without a section of their own report their missing weights, and the
+        // sections the count promises are reported missing.
+        std::erase_if(w, [](const std::string& m) {
+            return m.find("weights_fraction") != std::string::npos || m.find(" missing (") != std::string::npos;
+        });
         if (*c.warning) {
             ASSERT_EQ(w.size(), 1u);
             EXPECT_NE(w[0].find(c.warning), std::string::npos) << w[0];

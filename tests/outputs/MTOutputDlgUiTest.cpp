@@ -408,6 +408,26 @@ TEST(MTOutputItemMainDlg, OutputFileTypedOrChosen) {
     EXPECT_EQ(o->FileName(), "/data/b.qrd0");
     EXPECT_EQ(Child<QLineEdit>(page, "outputFile")->text(), "/data/b.qrd0");
     EXPECT_EQ(host.hints, (std::vector<int>{1}));
+
+    // A name chosen without an ending takes the format's, so that it validates.
+    const struct {
+        int format;
+        const char* chosen;
+        const char* stored;
+    } cases[] = {
+        {0, "/data/c", "/data/c.qrd0"},
+        {1, "/data/c", "/data/c.qrd1"},
+        {2, "/data/c", "/data/c.qrdu"},
+        {0, "/data/c.txt", "/data/c.txt"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.chosen);
+        o->Format(c.format);
+        page->SetData();
+        FileChooserStub bare(c.chosen);
+        Child<QPushButton>(page, "browseOutputFile")->click();
+        EXPECT_EQ(o->FileName(), c.stored);
+    }
 }
 
 // --- quantities ---------------------------------------------------------------------------

@@ -211,26 +211,39 @@ TEST(MTOutputKiv, RoundTripKeepsEveryValueWhateverTheUsersUnits) {
 }
 
 TEST(MTOutputKiv, ReadingTheGeometry) {
+    const std::vector<std::pair<double, double>> defaultCorners = {
+        {980, 4960}, {980, 9040}, {3020, 9040}, {3020, 4960}};
     struct Case {
         const char* name;
         const char* body;
         std::vector<std::pair<double, double>> corners;
         std::vector<std::string> points;
-        bool warned;
+        const char* warning;  // part of the one warning expected, or null for none
     };
+    // Without number_of_points an output has no points, whatever its default was.
     const Case cases[] = {
         {"older area form", "AREA {\nnumber_of_points = 0\nx_min = 1.0\nx_max = 2.0\ny_min = 3.0\ny_max = 4.0\n}\n",
-         {{1, 3}, {1, 4}, {2, 4}, {2, 3}}, {"Point 1"}, false},
-        {"area without corners stays empty", "AREA {\nnumber_of_points = 0\n}\n", {}, {"Point 1"}, false},
+         {{1, 3}, {1, 4}, {2, 4}, {2, 3}}, {}, nullptr},
+        {"area without corners stays empty", "AREA {\nnumber_of_points = 0\n}\n", {}, {}, nullptr},
+        {"area without a count has no corners", "AREA {\nlayer_min = 1\n}\n", {}, {}, nullptr},
+        {"area without a count takes the older form", "AREA {\nx_min = 1.0\nx_max = 2.0\n}\n",
+         {{1, 0}, {1, 0}, {2, 0}, {2, 0}}, {}, nullptr},
         {"missing points are reported",
-         "number_of_points = 3\nPOINT_1 {\nname = \"a\"\n}\nPOINT_3 {\nx = 1.0\n}\n",
-         {{980, 4960}, {980, 9040}, {3020, 9040}, {3020, 4960}}, {"a", "POINT_3"}, true},
-        {"a count no output holds keeps the points", "number_of_points = -4\n",
-         {{980, 4960}, {980, 9040}, {3020, 9040}, {3020, 4960}}, {"Point 1"}, true},
-        {"no count keeps the points", "", {{980, 4960}, {980, 9040}, {3020, 9040}, {3020, 4960}},
-         {"Point 1"}, false},
+         "number_of_points = 3\nPOINT_1 {\nname = \"a\"\n}\nPOINT_3 {\nx = 1.0\n}\n", defaultCorners,
+         {"a", "POINT_3"}, "1 of 3 sections is missing (POINT_2); those points are left out"},
+        {"a count no output holds reads as 0", "number_of_points = -4\n", defaultCorners, {},
+         "number_of_points = -4 is not between 0 and 10000000; read as 0"},
+        {"a count of the wrong type reads as 0",
+         "number_of_points = \"two\"\n", defaultCorners, {},
+         "expects an integer"},
+        // The file's point is not replaced by the default one: it is reported as unread.
+        {"no count reads as 0", "POINT_1 {\nname = \"mine\"\nx = 5.0\n}\n", defaultCorners, {},
+         "POINT_1"},
+        {"no count and no points", "", defaultCorners, {}, nullptr},
         {"missing corner", "AREA {\nnumber_of_points = 2\nPOINT_2 {\nx = 5.0\ny = 6.0\n}\n}\n", {{5, 6}},
-         {"Point 1"}, true},
+         {}, "1 of 2 sections is missing (POINT_1)"},
+        {"points beyond the count", "number_of_points = 1\nPOINT_1 {\n}\nPOINT_2 {\n}\n", defaultCorners,
+         {"POINT_1"}, "POINT_2"},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.name);
@@ -247,28 +260,39 @@ TEST(MTOutputKiv, ReadingTheGeometry) {
         for (const MTOutputPoint& p : o->Points())
             names.push_back(p.name);
         EXPECT_EQ(names, c.points);
-        EXPECT_EQ(!r.warnings.empty(), c.warned);
+        if (!c.warning) {
+            EXPECT_TRUE(r.warnings.empty());
+            continue;
+        }
+        ASSERT_EQ(r.warnings.size(), 1u);
+        EXPECT_NE(r.warnings[0].message.find(c.warning), std::string::npos) << r.warnings[0].message;
     }
 }
 
-TEST(MTOutputKiv, NumberOfOutputsIsBoundedAndAMissingOneKeepsTheCount) {
-    auto r = CSetupDocument::FromText(SetupText(false, false, "number_of_outputs = 2000000\n"), "t.setup");
-    EXPECT_EQ(Outputs(*r.document)->GetItemCount(), 0);
-    ASSERT_EQ(r.warnings.size(), 1u);
-    EXPECT_NE(r.warnings[0].message.find("number_of_outputs"), std::string::npos);
-    // The list's own count alone still sizes the list.
-    auto counted = Load(SetupText(false, false, "ZoSEKivListItemCount = 2\n"));
-    EXPECT_EQ(Outputs(*counted)->GetItemCount(), 2);
-    auto both = Load(SetupText(false, false, "ZoSEKivListItemCount = 2\nnumber_of_outputs = 3\n"));
-    EXPECT_EQ(Outputs(*both)->GetItemCount(), 3);
-}
-
-TEST(MTOutputKiv, LineKeywordOverridesTheOlderCount) {
-    auto doc = Load(SetupText(false, false,
-                              "number_of_outputs = 2\nOUTPUT_1 {\nno_of_points_on_line = 9\n}\n"
-                              "OUTPUT_2 {\nno_of_points_on_line = 9\nLINE {\nnpoints = 4\n}\n}\n"));
-    EXPECT_EQ(Output(*doc, 1)->NumberOfPointsOnLine(), 9);
-    EXPECT_EQ(Output(*doc, 2)->NumberOfPointsOnLine(), 4);
+// However many points a count promises, what is missing costs one warning and no memory.
+TEST(MTOutputKiv, AHugeCountWithFewPointsIsReportedOnce) {
+    auto r = CSetupDocument::FromText(
+        SetupText(true, false,
+                  "number_of_outputs = 1\nOUTPUT_1 {\nnumber_of_points = 2000000\n"
+                  "POINT_2 {\n}\nPOINT_7 {\n}\nPOINT_01 {\n}\nPOINT_2000001 {\n}\n"
+                  "AREA {\nnumber_of_points = 9000000\n}\n}\n"),
+        "t.setup");
+    ASSERT_TRUE(r.document);
+    EXPECT_EQ(Output(*r.document, 1)->Points().size(), 2u);
+    EXPECT_TRUE(Output(*r.document, 1)->Polygon().empty());
+    // Neither a number written otherwise than a count writes it nor one beyond the count is
+    // read: those are reported as unread where they stand.
+    const char* const expected[] = {
+        "1999998 of 2000000 sections are missing (POINT_1, POINT_3, POINT_4, POINT_5, POINT_6 and "
+        "1999993 more); those points are left out",
+        "'POINT_01'",
+        "'POINT_2000001'",
+        "9000000 of 9000000 sections are missing (POINT_1, POINT_2, POINT_3, POINT_4, POINT_5 and "
+        "8999995 more); those points are left out",
+    };
+    ASSERT_EQ(r.warnings.size(), std::size(expected));
+    for (size_t i = 0; i < std::size(expected); ++i)
+        EXPECT_NE(r.warnings[i].message.find(expected[i]), std::string::npos) << r.warnings[i].message;
 }
 
 // --- quantities ---------------------------------------------------------------------------
@@ -465,8 +489,9 @@ TEST(MTOutputItemMainKiv, DomainChangesReachTheOutputs) {
     EXPECT_EQ(Output(*doc, 1)->Type(), 1);
     EXPECT_EQ(Output(*doc, 1)->Format(), 2);
     EXPECT_EQ(Output(*doc, 2)->Type(), 3);
+    // Mass budgets and discharges keep their kind, but no output keeps a volume.
     EXPECT_EQ(Output(*doc, 3)->Type(), 4);
-    EXPECT_EQ(Output(*doc, 3)->Format(), 3);
+    EXPECT_EQ(Output(*doc, 3)->Format(), 2);
     doc->GetDomain()->LayerCount1(6);
     EXPECT_EQ(Output(*doc, 2)->LayerMax(), 6);
 }
@@ -487,18 +512,18 @@ TEST(MTOutputItemMainKiv, PointsImportedOnLoading) {
     ASSERT_TRUE(good.document);
     EXPECT_TRUE(good.warnings.empty());
     CMTOutputItemMainKiv* o = Output(*good.document, 1);
-    ASSERT_EQ(o->Points().size(), 3u);  // the default point, then the file's
-    EXPECT_EQ(o->Points()[1].name, "north");
-    EXPECT_EQ(o->Points()[1].layer, -3);
-    EXPECT_EQ(o->Points()[2].layer, 2);
-    EXPECT_EQ(o->Points()[2].y, 210.0);
+    ASSERT_EQ(o->Points().size(), 2u);  // no number_of_points: only the file's
+    EXPECT_EQ(o->Points()[0].name, "north");
+    EXPECT_EQ(o->Points()[0].layer, -3);
+    EXPECT_EQ(o->Points()[1].layer, 2);
+    EXPECT_EQ(o->Points()[1].y, 210.0);
     EXPECT_EQ(o->InputFormat(), 1);
 
     auto bad = CSetupDocument::Open((dir.path / "bad.setup").string());
     ASSERT_TRUE(bad.document);
     ASSERT_EQ(bad.warnings.size(), 1u);
     EXPECT_NE(bad.warnings[0].message.find("bad.xyz"), std::string::npos) << bad.warnings[0].message;
-    EXPECT_EQ(Output(*bad.document, 1)->Points().size(), 1u);
+    EXPECT_TRUE(Output(*bad.document, 1)->Points().empty());
     EXPECT_EQ(Output(*bad.document, 1)->InputFormat(), 2);
 }
 

@@ -1,4 +1,5 @@
 // The main of the UI tests: one QApplication for all of them, no display needed.
+#include "support/PrivateTempDir.h"
 #include "widgets/ZoPrompts.h"
 
 #include <QApplication>
@@ -6,6 +7,7 @@
 #include <gtest/gtest.h>
 
 int main(int argc, char** argv) {
+    testsupport::PrivateTempDir temp;
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
         qputenv("QT_QPA_PLATFORM", "offscreen");
     QApplication app(argc, argv);

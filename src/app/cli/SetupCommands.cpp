@@ -52,7 +52,9 @@ void PrintWarnings(const std::vector<paramfile::Diagnostic>& warnings) {
 std::unique_ptr<CSetupDocument> OpenOrReport(const std::string& path, size_t* warnings = nullptr) {
     CSetupDocument::OpenResult opened = CSetupDocument::Open(path);
     if (opened.error) {
-        std::cerr << opened.error->ToString() << "\n";
+        // A file that cannot be read, or is no setup at all, has no place to point to.
+        const paramfile::Diagnostic& e = *opened.error;
+        std::cerr << (e.pos.line > 0 ? e.ToString() : "mudsetup: " + e.message) << "\n";
         return nullptr;
     }
     PrintWarnings(opened.warnings);

@@ -2,12 +2,14 @@
 #include "Commands.h"
 
 #include <csignal>
+#include <cstring>
 #include <iostream>
 
 namespace {
 
 const char* const kUsage =
     "usage: mudsetup <command> [options]\n"
+    "       mudsetup --version\n"
     "\n"
     "commands:\n"
     "  new [--fractions N] [--layers N] [-o FILE]   write a new setup with all defaults\n"
@@ -32,6 +34,10 @@ int main(int argc, char** argv) {
     // Past a file-size limit a write then fails, and the save cleans up and says so, rather
     // than the process dying silently.
     std::signal(SIGXFSZ, SIG_IGN);
+    if (argc == 2 && !std::strcmp(argv[1], "--version")) {
+        std::cout << "mudsetup " MUDSETUP_VERSION "\n";
+        return cli::FlushStdout() ? cli::kExitOk : cli::kExitError;
+    }
     int status = cli::kExitOk;
     CLI::App app(kUsage, "mudsetup");
     app.require_subcommand(1);

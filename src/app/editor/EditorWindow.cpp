@@ -307,7 +307,8 @@ void CEditorWindow::BuildActions() {
                                        [this] { OnSave(); });
     saveAct->setShortcut(QKeySequence::Save);
     QAction* saveAsAct = file->addAction(tr("Save &As..."), this, [this] { OnSaveAs(); });
-    saveAsAct->setShortcut(QKeySequence::SaveAs);
+    // The platform's standard key for Save As is empty on some desktops.
+    saveAsAct->setShortcut(QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_S));
     file->addSeparator();
     QAction* quitAct = file->addAction(tr("&Quit"), this, &QWidget::close);
     quitAct->setShortcut(QKeySequence::Quit);
@@ -521,7 +522,7 @@ void CEditorWindow::SetModified(bool modified) {
 
 void CEditorWindow::UpdateTitle() {
     const QString name = m_path.isEmpty() ? tr("Untitled") : QFileInfo(m_path).fileName();
-    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor").arg(name));
+    setWindowTitle(tr("%1[*] - Mud Transport Setup Editor %2").arg(name, QStringLiteral(MUDSETUP_VERSION)));
     setWindowModified(m_modified);
 }
 
@@ -1129,7 +1130,11 @@ void CEditorWindow::UpdateRecentMenu() {
     const QStringList files = EditorSettings().value("recentFiles").toStringList();
     for (int i = 0; i < files.size(); ++i) {
         const QString path = files[i];
-        QAction* a = m_recentMenu->addAction(QStringLiteral("&%1 %2").arg(i + 1).arg(QFileInfo(path).fileName()),
+        // The folder tells apart setups of the same name; '&' would mark a key.
+        const QFileInfo info(path);
+        QString text = QStringLiteral("%1  (%2)").arg(info.fileName(), QDir::toNativeSeparators(info.absolutePath()));
+        text.replace('&', QStringLiteral("&&"));
+        QAction* a = m_recentMenu->addAction(QStringLiteral("&%1 %2").arg(i + 1).arg(text),
                                              this, [this, path] {
                                                  if (MaybeSave())
                                                      OpenFile(path);

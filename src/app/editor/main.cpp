@@ -5,6 +5,7 @@
 #include "PreferencesDialog.h"
 
 #include <QApplication>
+#include <QIcon>
 #include <QStyleFactory>
 #include <QTimer>
 
@@ -19,6 +20,7 @@ namespace {
 const char* const kUsage =
     "usage: mudsetup-editor [FILE]\n"
     "       mudsetup-editor --screenshot OUT.png [--select PATH] FILE\n"
+    "       mudsetup-editor --version\n"
     "\n"
     "Opens FILE (a new setup without one). With --screenshot the window is drawn without a\n"
     "display, with the node at PATH selected (as 'mudsetup validate' prints paths, e.g.\n"
@@ -114,6 +116,9 @@ int main(int argc, char** argv) {
         if (!std::strcmp(argv[i], "--help") || !std::strcmp(argv[i], "-h")) {
             std::fputs(kUsage, stdout);
             return 0;
+        } else if (!std::strcmp(argv[i], "--version")) {
+            std::fputs("mudsetup-editor " MUDSETUP_VERSION "\n", stdout);
+            return 0;
         }
     Options options;
     std::string error;
@@ -134,6 +139,10 @@ int main(int argc, char** argv) {
     QApplication app(argc, argv);
     QApplication::setOrganizationName("mudsetup");
     QApplication::setApplicationName("mudsetup-editor");
+    QApplication::setApplicationVersion(QStringLiteral(MUDSETUP_VERSION));
+    // The installed icon and desktop entry, so that the desktop groups the windows under them.
+    QApplication::setDesktopFileName(QStringLiteral("mudsetup-editor"));
+    QApplication::setWindowIcon(QIcon::fromTheme(QStringLiteral("mudsetup-editor")));
     if (QStyle* fusion = QStyleFactory::create("Fusion"))
         QApplication::setStyle(fusion);
     CPreferencesDialog::LoadRemembered();

@@ -64,6 +64,12 @@ CSetupDocument::OpenResult CSetupDocument::FromParsed(paramfile::ParseResult par
     OpenResult result;
     if (parsed.error) {
         result.error = parsed.error;
+        // What the parser would say of a picture or a data file helps nobody.
+        if (parsed.beforeFirstSection)
+            result.error = paramfile::Diagnostic{
+                fileName, {},
+                FormatString("%s is not a setup file: no section at line %d", fileName.c_str(),
+                             parsed.error->pos.line)};
         return result;
     }
     auto doc = std::make_unique<CSetupDocument>();

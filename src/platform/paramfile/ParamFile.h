@@ -158,6 +158,8 @@ private:
 struct ParseResult {
     std::unique_ptr<Document> document;  // null when error is set
     std::optional<Diagnostic> error;
+    // The error came before the first section opened: the text is not a parameter file.
+    bool beforeFirstSection = false;
 };
 
 // Every entry below section that no look-up found, one message each at its place ("unknown

@@ -135,6 +135,8 @@ public:
 
     bool Run();
     Diagnostic error;
+    // The document's root is its first section.
+    bool OpenedASection() const { return d_.sections.size() > 1; }
 
 private:
     Position PosOf(const char* at) const { return {line_, static_cast<int>(at - lineStart_) + 1}; }
@@ -679,6 +681,7 @@ ParseResult ParseText(std::string text, std::string fileName) {
     Reader reader(text, *doc);
     if (!reader.Run()) {
         result.error = std::move(reader.error);
+        result.beforeFirstSection = !reader.OpenedASection();
         return result;
     }
     result.document = std::move(doc);

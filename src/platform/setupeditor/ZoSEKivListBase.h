@@ -25,6 +25,14 @@ public:
     virtual int GetItemCount() const = 0;
     virtual CZoSEKivBase* GetItemNode(int index) const = 0;  // 1-based, null outside
     virtual void ReInitialize(int level, bool force) = 0;
+
+protected:
+    // The keyword besides ZoSEKivListItemCount through which the file gives the number of
+    // items ("number_of_outputs"), or null.
+    virtual const char* CountKeyword() const { return nullptr; }
+    // Once the list's section was read: one warning for the items whose sections it lacks,
+    // when the section gives a count.
+    void ReportMissingItems(void* section);
 };
 
 struct NodeInListOfSyncedLists {
@@ -222,6 +230,14 @@ public:
             return;
         }
         SetItemCount(n, 1);
+    }
+
+    void Load(void* h) override {
+        CZoSEKivListBaseInterface::Load(h);
+        if (!h || GetSectionNamePattern().empty())
+            return;
+        if (void* own = kivSectionByNameNum(h, GetSectionName().c_str(), 1))
+            ReportMissingItems(own);
     }
 
     // A count the engine reads beside the list's own (which LoadSize applied) has the last

@@ -13,6 +13,7 @@
 #include <QHeaderView>
 #include <QLabel>
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QMessageBox>
 #include <QMetaObject>
 #include <QPointer>
@@ -160,10 +161,12 @@ QString ZoGetOpenFileName(QWidget* parent, const QString& caption, const QString
 }
 
 QString ZoGetSaveFileName(QWidget* parent, const QString& caption, const QString& startPath,
-                          const QString& filter) {
-    if (FileHook())
-        return FileHook()(parent, caption, startPath, filter);
-    return QFileDialog::getSaveFileName(parent, caption, startPath, filter);
+                          const QString& filter, const QString& defaultExt) {
+    QString chosen = FileHook() ? FileHook()(parent, caption, startPath, filter)
+                                : QFileDialog::getSaveFileName(parent, caption, startPath, filter);
+    if (!chosen.isEmpty() && !defaultExt.isEmpty() && QFileInfo(chosen).suffix().isEmpty())
+        chosen += '.' + defaultExt;
+    return chosen;
 }
 
 ZoOpenFileHook ZoSetOpenFileHook(ZoOpenFileHook hook) {

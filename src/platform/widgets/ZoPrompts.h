@@ -33,9 +33,10 @@ ZoMessageSink ZoSetMessageSink(ZoMessageSink sink);
 QString ZoGetOpenFileName(QWidget* parent, const QString& caption, const QString& startPath,
                           const QString& filter);
 
-// Asks the user for a file to write (it need not exist); the same hook answers it.
+// Asks the user for a file to write (it need not exist); the same hook answers it. A name
+// chosen without an extension gets defaultExt (without the dot), where one is given.
 QString ZoGetSaveFileName(QWidget* parent, const QString& caption, const QString& startPath,
-                          const QString& filter);
+                          const QString& filter, const QString& defaultExt = QString());
 
 using ZoOpenFileHook = std::function<QString(QWidget* parent, const QString& caption,
                                              const QString& startPath, const QString& filter)>;

@@ -4,6 +4,7 @@
 #include <sys/stat.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
@@ -255,14 +256,57 @@ TEST_F(Cli, InputThatIsNoSetupFileIsRefused) {
         {P("fifo"), "not a regular file"},
         {P("folder"), "Is a directory"},
         {P("huge.setup"), "larger than 2147483646 bytes"},
+        {P("nowhere.setup"), "No such file or directory"},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.input);
         // A reader that waited or read on would be stopped by timeout (exit 124).
         Result r = Mudsetup("validate " + c.input, "timeout 20 ");
         EXPECT_EQ(r.exitCode, 2);
-        EXPECT_EQ(r.err, c.input + ":0:0: cannot read '" + c.input + "': " + c.why + "\n");
+        // Without a place in the file to point to, the message has none.
+        EXPECT_EQ(r.err, "mudsetup: cannot read '" + c.input + "': " + c.why + "\n");
     }
+    // Text that does not start with a section is no setup: a parser's message would not say so.
+    const struct {
+        const char* name;
+        std::string text;
+        int line;
+    } contents[] = {
+        {"picture.png", std::string("\x89PNG\r\n\x1a\n\0\0\0\rIHDR", 16), 1},
+        {"series.csv", "time,level\n0,1.5\n", 1},
+        {"notes.setup", "# the estuary\n\nmode = 2\nMUD_TRANSPORT_MODULE {\n}\n", 3},
+        {"brace.setup", "}\n", 1},
+    };
+    for (const auto& c : contents) {
+        SCOPED_TRACE(c.name);
+        WriteFile(dir / c.name, c.text);
+        Result r = Mudsetup(std::string("format ") + P(c.name));
+        EXPECT_EQ(r.exitCode, 2);
+        EXPECT_EQ(r.err, "mudsetup: " + P(c.name) + " is not a setup file: no section at line " +
+                             std::to_string(c.line) + "\n");
+        EXPECT_EQ(ReadFile(dir / c.name), c.text);
+    }
+}
+
+// A count of millions with no items behind it is one warning, and the setup saves small.
+TEST_F(Cli, AHugeCountOfMissingPointsIsOneWarning) {
+    ASSERT_EQ(Mudsetup("new -o " + P("base.setup")).exitCode, 0);
+    std::string text = ReadFile(dir / "base.setup");
+    const std::string empty = "ZoSEKivListItemCount = 0\n        number_of_outputs = 0\n";
+    const size_t at = text.find(empty);
+    ASSERT_NE(at, std::string::npos);
+    text.replace(at, empty.size(),
+                 "number_of_outputs = 1\n        OUTPUT_1 {\n            number_of_points = 2000000\n"
+                 "        }\n");
+    WriteFile(dir / "big.setup", text);
+    Result r = Mudsetup("format " + P("big.setup") + " -o " + P("out.setup"));
+    EXPECT_EQ(r.exitCode, 0) << r.err;
+    EXPECT_LT(std::count(r.err.begin(), r.err.end(), '\n'), 10) << r.err.substr(0, 2000);
+    EXPECT_LT(r.err.size(), 1000u);
+    EXPECT_NE(r.err.find("2000000 of 2000000 sections are missing"), std::string::npos) << r.err;
+    // The output has no points: it is no bigger than the setup it came from with one output.
+    EXPECT_LT(fs::file_size(dir / "out.setup"), text.size() + 20000);
+    EXPECT_NE(ReadFile(dir / "out.setup").find("number_of_points = 0"), std::string::npos);
 }
 
 // Saving replaces only regular files (through links); a size limit fails the save cleanly,

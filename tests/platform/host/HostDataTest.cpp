@@ -27,7 +27,7 @@ public:
 
 void Fill(CSetupDocument& doc) {
     CDomainKiv* d = doc.GetDomain();
-    d->MeshFile("mesh\\estuary.mesh");
+    d->MeshFile("mesh\\estuary.2dm");
     d->SetMeshInfo({470000.5, 560000.25, 5920000, 5980000, -35.5, 2.0});
     d->Projection("UTM-32");
     d->ThreeD(true);
@@ -64,7 +64,7 @@ TEST(HostData, EveryValueSurvivesSaveAndLoad) {
 
     const CDomainKiv* d = back->GetDomain();
     EXPECT_TRUE(d->MeshExist());
-    EXPECT_EQ(d->MeshFile(), "mesh\\estuary.mesh");
+    EXPECT_EQ(d->MeshFile(), "mesh\\estuary.2dm");
     const MeshInfo box = d->GetMeshInfo();
     EXPECT_EQ(box.xMin, 470000.5);
     EXPECT_EQ(box.xMax, 560000.25);
@@ -209,7 +209,7 @@ TEST(HostData, DomainChangesReachItsListeners) {
     d->LayerCount1(8);
     d->LayerCount2(2);
     d->VerticalKind(2);
-    d->MeshFile("a.mesh");
+    d->MeshFile("a.2dm");
     d->SetMeshInfo({});
     d->Projection("LONG/LAT");
     EXPECT_EQ(spy.messages, (std::vector<ENotifyMessage>{3, 11, 11, 11, 10, 10, 10}));
@@ -264,7 +264,7 @@ TEST(HostData, DomainValidation) {
     CDomainKiv* d = doc.GetDomain();
     d->ThreeD(true);
     d->LayerCount1(0);
-    d->MeshFile("m.mesh");
+    d->MeshFile("m.2dm");
     d->SetMeshInfo({10, 0, 0, 1, 0, 0});
     d->VerticalKind(3);
     EXPECT_EQ(doc.ValidateAll(), 0);

@@ -73,16 +73,17 @@ TEST(ReadingReports, EachCaseAtItsPlace) {
          "keyword 'mode' repeated in MUD_TRANSPORT_MODULE: only the first is read", nullptr,
          true},
         {"unknown keyword in a host section",
-         "DOMAIN {\n    @mesh_fiel = 'a.mesh'\n}\n" + Module(""),
+         "DOMAIN {\n    @mesh_fiel = 'a.2dm'\n}\n" + Module(""),
          "unknown keyword 'mesh_fiel' in DOMAIN", nullptr, true},
         {"list longer than the layers",
          Module("    BED {\n        BED_DENSITY {\n            @ZoSEKivListItemCount = 2\n"
+                "            LAYER_1 {\n            }\n            LAYER_2 {\n            }\n"
                 "        }\n    }\n"),
          "ZoSEKivListItemCount = 2, but the setup has 1 layer",
          "2 items, but the setup has 1 layer", false},
         {"transitions of too few layers",
          Module("    BED {\n        TRANSITION {\n            @ZoSEKivListItemCount = 1\n"
-                "        }\n    }\n"),
+                "            LAYER_1 {\n            }\n        }\n    }\n"),
          "ZoSEKivListItemCount = 1, but the setup has 1 layer (0 transitions)",
          "1 item, but the setup has 1 layer (0 transitions)", false},
         {"item beyond the count",

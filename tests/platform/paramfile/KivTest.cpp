@@ -37,14 +37,14 @@ TEST(Kiv, WrittenValuesReadBack) {
     kivPutParam(h, "enabled", true);
     kivPutParam(h, "title", "estuary"); // a literal must not become a boolean
     kivPutParam(h, "note", std::string("a \"quoted\" note"));
-    kivPutParamFilename(h, "bed", "C:\\data\\bed.dfsu");
+    kivPutParamFilename(h, "bed", "C:\\data\\bed.qrdu");
     kivAddKeyword(h, "list");
     kivAddInt(h, -4);
     kivAddDouble(h, 1e-9);
     kivAddFloat(h, 2.5f);
     kivAddString(h, "s");
-    kivAddFilename(h, "in.dfs0");
-    kivAddResultFilename(h, "out.dfs0");
+    kivAddFilename(h, "in.qrd0");
+    kivAddResultFilename(h, "out.qrd0");
     kivPutListParam(h, "mixed", "idfbsF", 7, 0.25, 0.1, 1, "txt", "f'q.txt");
     kivAddSection(h, "Fraction");
     kivPutParam(h, "d50", 1);
@@ -77,7 +77,7 @@ TEST(Kiv, WrittenValuesReadBack) {
     kivGetParam(mud, "note", &s, 1, 1);
     EXPECT_EQ(s, "a \"quoted\" note");
     kivGetParamFilename(mud, "bed", &s, 1, 1);
-    EXPECT_EQ(s, "C:\\data\\bed.dfsu");
+    EXPECT_EQ(s, "C:\\data\\bed.qrdu");
 
     void* list = kivKeywordByNameNum(mud, "list", 1);
     ASSERT_EQ(kivParamCount(list), 6);
@@ -86,7 +86,7 @@ TEST(Kiv, WrittenValuesReadBack) {
     EXPECT_EQ(kivGetDouble(kivParamByNum(list, 1)), -4.0);
     EXPECT_EQ(kivGetInt(kivParamByNum(list, 2)), 0);    // not an integer
     EXPECT_EQ(kivGetDouble(kivParamByNum(list, 4)), 0); // not a number
-    EXPECT_EQ(kivGetResultFilename(kivParamByNum(list, 6)), "out.dfs0");
+    EXPECT_EQ(kivGetResultFilename(kivParamByNum(list, 6)), "out.qrd0");
     EXPECT_EQ(kivParamByNum(list, 7), nullptr);
     EXPECT_EQ(kivParamByNum(list, 0), nullptr);
 

@@ -341,8 +341,8 @@ TEST(ParamFileWriter, EdgeValuesRoundTripExactly) {
                                    "\xE6\xB0\xB4 \xF0\x9F\x8C\x8A",
                                    std::string("nul\0byte", 8),
                                    "\xff\xfe invalid"};
-    const std::string files[] = {"C:\\Program Files\\model\\run.m21",
-                                 "\\\\server\\share\\it's.dfs",
+    const std::string files[] = {"C:\\Program Files\\model\\run.setup",
+                                 "\\\\server\\share\\it's.qrd0",
                                  "''",
                                  "/tmp/a b/#c,d.txt",
                                  "\xC3\xA9t\xC3\xA9.dat",

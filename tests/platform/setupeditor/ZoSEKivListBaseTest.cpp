@@ -206,7 +206,11 @@ protected:
 };
 
 TEST_F(CountInFile, CountAndItemsAreRead) {
-    EXPECT_TRUE(LoadWith("ZoSEKivListItemCount = 3\n ITEM_3 {\n value = 33\n }").empty());
+    // Items the count promises but the file lacks are reported once, at the count.
+    const auto warnings = LoadWith("ZoSEKivListItemCount = 3\n ITEM_3 {\n value = 33\n }");
+    ASSERT_EQ(warnings.size(), 1u);
+    EXPECT_EQ(warnings[0].pos.line, 3);
+    EXPECT_EQ(warnings[0].message, "2 of 3 sections are missing (ITEM_1, ITEM_2); those items take their defaults");
     ASSERT_EQ(list->GetItemCount(), 3);
     EXPECT_EQ(list->GetItem(1)->value, 7);
     EXPECT_EQ(list->GetItem(3)->value, 33);
@@ -222,14 +226,16 @@ TEST_F(CountInFile, AbsurdCountsAreRefusedWithAWarning) {
         SCOPED_TRACE(count);
         const auto warnings = LoadWith(std::string("ZoSEKivListItemCount = ") + count);
         EXPECT_EQ(list->GetItemCount(), 2);
-        ASSERT_EQ(warnings.size(), 1u);
+        // The items kept have no sections either, which is said as well.
+        ASSERT_EQ(warnings.size(), 2u);
         EXPECT_EQ(warnings[0].pos.line, 3);
         EXPECT_NE(warnings[0].message.find("kept 2"), std::string::npos) << warnings[0].message;
+        EXPECT_NE(warnings[1].message.find("2 of 2 sections are missing"), std::string::npos);
     }
 }
 
 TEST_F(CountInFile, CountOfTheWrongTypeKeepsTheConstructedCount) {
-    const auto warnings = LoadWith("ZoSEKivListItemCount = \"three\"");
+    const auto warnings = LoadWith("ZoSEKivListItemCount = \"three\"\n ITEM_1 {\n }\n ITEM_2 {\n }");
     EXPECT_EQ(list->GetItemCount(), 2);
     EXPECT_EQ(warnings.size(), 1u);
 }
