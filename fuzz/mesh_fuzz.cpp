@@ -31,6 +31,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         for (int n : b.nodes)
             if (bad(n))
                 std::abort();
+    if (!m.zMissing.empty() && m.zMissing.size() != m.NodeCount())
+        std::abort();
+    for (const std::string& note : m.notes)
+        if (note.empty())
+            std::abort();
     const CMeshIndex index(m);
     const MeshExtent& ext = m.Extent();
     index.ElementAt((ext.xMin + ext.xMax) / 2, (ext.yMin + ext.yMax) / 2);

@@ -13,8 +13,9 @@ namespace {
 const char* const kMeshHelp =
     "usage: mudsetup mesh info FILE\n"
     "Reads a mesh (.2dm text, or UGRID netCDF .nc) and prints its numbers of nodes and\n"
-    "elements, its extent in x, y and z, the projection the file states, and its open\n"
-    "boundaries with their codes and names.\n"
+    "elements, its extent in x, y and z (\"bed level: none found\" when the file has none, and\n"
+    "on how many nodes it is missing), the projection the file states, its open boundaries\n"
+    "with their codes and names, and notes on what reading passed over or converted.\n"
     "Exit status: 0 read, 2 unreadable (FILE:LINE: message, or the netCDF error).\n";
 
 // The shortest text that reads back to the same number.
@@ -32,14 +33,22 @@ int Info(const std::string& file) {
     }
     const CMesh& m = *r.mesh;
     const MeshExtent& e = m.Extent();
-    std::cout << "file: " << file << "\n"
-              << "nodes: " << m.NodeCount() << "\n"
+    std::cout << "file: " << file << "\n";
+    if (!m.topology.empty())
+        std::cout << "topology: " << m.topology << "\n";
+    std::cout << "nodes: " << m.NodeCount() << "\n"
               << "elements: " << m.ElementCount() << " (" << m.TriangleCount() << " triangles, "
               << m.QuadrilateralCount() << " quadrilaterals)\n"
               << "x: " << Number(e.xMin) << " to " << Number(e.xMax) << "\n"
-              << "y: " << Number(e.yMin) << " to " << Number(e.yMax) << "\n"
-              << "z: " << Number(e.zMin) << " to " << Number(e.zMax) << "\n"
-              << "projection: "
+              << "y: " << Number(e.yMin) << " to " << Number(e.yMax) << "\n";
+    if (!m.HasBedLevel())
+        std::cout << "bed level: none found\n";
+    else
+        std::cout << "z: " << Number(e.zMin) << " to " << Number(e.zMax) << "\n";
+    if (m.HasBedLevel() && m.MissingBedLevelCount())
+        std::cout << "bed level: missing on " << m.MissingBedLevelCount() << " of " << m.NodeCount()
+                  << " nodes\n";
+    std::cout << "projection: "
               << (m.projection.empty() ? std::string("(not stated)") : m.projection) << "\n"
               << "open boundaries: " << m.boundaries.size() << "\n";
     for (size_t i = 0; i < m.boundaries.size(); ++i) {
@@ -47,6 +56,10 @@ int Info(const std::string& file) {
         std::cout << "  " << i + 1 << ": \"" << b.name << "\", code " << b.code << ", "
                   << b.nodes.size() << " nodes\n";
     }
+    if (!m.notes.empty())
+        std::cout << "notes:\n";
+    for (const std::string& note : m.notes)
+        std::cout << "  " << note << "\n";
     return FlushStdout() ? kExitOk : kExitError;
 }
 

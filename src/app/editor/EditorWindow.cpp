@@ -452,6 +452,11 @@ void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state
         return;  // texts come from ToText: cannot happen
     }
     m_state = state;
+    ShowAgain(path, hadNode);
+}
+
+void CEditorWindow::ShowAgain(const CString& path, bool hadNode) {
+    m_restoring = true;
     RebuildTree();
     CZoSEKivBase* target = nullptr;
     if (hadNode)
@@ -558,6 +563,9 @@ bool CEditorWindow::OpenFile(const QString& path) {
     SetDocument(std::move(opened.document), QFileInfo(path).absoluteFilePath());
     AddRecentFile(m_path);
     ShowReadWarnings(opened.warnings);
+    // A setup that disagrees with its files (a mesh or data file gone) says so at once.
+    if (!RunValidation(true))
+        m_messagesDock->show();
     if (opened.warnings.empty())
         statusBar()->showMessage(tr("Opened %1").arg(path), 5000);
     return true;
@@ -582,6 +590,26 @@ void CEditorWindow::AddReadWarningItems() {
         item->setToolTip(1, Q(w.message));
         item->setIcon(0, icon);
         item->setData(0, Qt::UserRole + 1, item->text(0));  // what Copy puts first
+    }
+}
+
+// What reading the mesh passed over or did not find: not errors, but a modeller should see them.
+void CEditorWindow::AddMeshNoteItems() {
+    CDomainKiv* domain = Domain(m_doc.get());
+    const MeshPtr mesh = domain ? domain->Mesh() : nullptr;
+    if (!mesh)
+        return;
+    const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxInformation);
+    const QString path = Q(NodePath(domain));
+    for (const std::string& note : mesh->notes) {
+        auto* item = new QTreeWidgetItem(m_messages);
+        item->setText(0, TitlePath(domain));
+        item->setToolTip(0, path);
+        item->setData(0, Qt::UserRole + 1, path);
+        item->setText(1, tr("mesh: %1").arg(Q(note)));
+        item->setToolTip(1, Q(note));
+        item->setIcon(0, icon);
+        SetNode(item, domain);
     }
 }
 
@@ -616,12 +644,25 @@ bool CEditorWindow::SaveFile(const QString& path) {
         return false;
     }
     m_path = QFileInfo(path).absoluteFilePath();
-    m_undo->setClean();
-    SetModified(false);
-    AddRecentFile(m_path);
     // The file now holds what the setup holds: what reading said of the old one is past
     // (the list shows it until the next validation).
     m_readWarnings.clear();
+    if (m_state && m_doc->ToText() != *m_state) {
+        // Saved into another folder, relative file names were rewritten to name the same
+        // files from there: the form shows the new names, the states before hold the old
+        // ones (no longer right from here), and the files are checked from the new place.
+        CloseDialog(false);
+        const CString shown = m_currentNode ? NodePath(m_currentNode) : CString();
+        const bool hadNode = m_currentNode != nullptr;
+        m_currentNode = nullptr;
+        ShowAgain(shown, hadNode);
+        StartNewHistory();
+        RunValidation(false);
+    } else {
+        m_undo->setClean();
+        SetModified(false);
+    }
+    AddRecentFile(m_path);
     const int problems = static_cast<int>(m_doc->Errors().size());
     statusBar()->showMessage(problems ? tr("Saved %1 with %2")
                                             .arg(path, Plural(problems, "validation message", "validation messages"))
@@ -673,6 +714,7 @@ bool CEditorWindow::RunValidation(bool quiet) {
 void CEditorWindow::FillMessages(bool valid) {
     m_messages->clear();
     AddReadWarningItems();
+    AddMeshNoteItems();
     const QIcon icon = style()->standardIcon(QStyle::SP_MessageBoxCritical);
     for (const CZoSEKivGlobalBase::ErrorEntry& e : m_doc->Errors()) {
         auto* item = new QTreeWidgetItem(m_messages);

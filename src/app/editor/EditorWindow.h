@@ -112,6 +112,9 @@ private:
     QString EditName(CZoSEDlgBase* dialog, int hint) const;
     // Makes the document the state of the text (undo, redo); the form follows.
     void RestoreState(const std::shared_ptr<const std::string>& state);
+    // The tree and the form again after the nodes were read anew; the form of the node at
+    // path when there was one.
+    void ShowAgain(const CString& path, bool hadNode);
     // Takes in changes that were made without an update hint (validation corrects some).
     void SyncState(const QString& name);
     void StartNewHistory();
@@ -126,6 +129,7 @@ private:
     void UpdateTitle();
     QMessageBox::StandardButton Ask(const Prompt& prompt);
     void AddReadWarningItems();
+    void AddMeshNoteItems();
 
     std::vector<ShownEntry> CollectModuleEntries() const;
     void RebuildTree();

@@ -241,6 +241,12 @@ public:
         vertical->addRow(tr("Layers in total"), m_total);
         m_counts = new QLabel(this);
         mesh->addRow(tr("Contents"), m_counts);
+        // What reading the mesh passed over, converted or did not find.
+        m_notes = new QLabel(this);
+        m_notes->setObjectName("meshNotes");
+        m_notes->setWordWrap(true);
+        m_notes->setTextInteractionFlags(Qt::TextSelectableByMouse);
+        mesh->addRow(m_notes);
 
         connect(m_file, &QLineEdit::editingFinished, this, [this] {
             if (S(m_file->text()) != Node()->MeshFile())
@@ -343,7 +349,8 @@ public:
         m_sigma->setEnabled(d->ThreeD());
         m_z->setEnabled(d->ThreeD() && d->VerticalKind() == 2);
         m_map->SetData();
-        if (const MeshPtr& m = d->Mesh())
+        const MeshPtr& m = d->Mesh();
+        if (m)
             m_counts->setText(tr("%1 nodes, %2 triangles, %3 quadrilaterals, %4 open boundaries")
                                   .arg(m->NodeCount())
                                   .arg(m->TriangleCount())
@@ -351,6 +358,13 @@ public:
                                   .arg(m->boundaries.size()));
         else
             m_counts->setText(d->MeshExist() ? tr("The mesh cannot be read") : tr("No mesh"));
+        QStringList notes;
+        if (m)
+            for (const std::string& note : m->notes)
+                notes << QStringLiteral("\u2022 ") + Q(note);
+        m_notes->setText(notes.isEmpty() ? QString()
+                                         : tr("Read with notes:\n%1").arg(notes.join('\n')));
+        m_notes->setVisible(!notes.isEmpty());
     }
 
 private:
@@ -369,6 +383,7 @@ private:
     }
     QLineEdit* m_file = nullptr;
     QLabel* m_counts = nullptr;
+    QLabel* m_notes = nullptr;
     CMeshNavigationDlg* m_map = nullptr;
     CZoProjectionCombo* m_projection = nullptr;
     NumberEdit* m_extent[3][2] = {};

@@ -43,7 +43,9 @@ public:
     // sections of other modules stay as read. False, and nothing changed, when the text does
     // not parse.
     bool Restore(const std::string& text);
-    // Atomic: on failure the file on disk and this document stay as they were.
+    // Atomic: on failure the file on disk and this document stay as they were. Saved into
+    // another folder, every relative file name is rewritten to name the same file from there
+    // (in the file and in the nodes, RebasedFileName).
     bool SaveAs(const std::string& path, std::string* error);
 
     // What the file held that no node reads, so that saving drops it (one warning each, also
@@ -80,6 +82,10 @@ private:
         return node;
     }
     static OpenResult FromParsed(paramfile::ParseResult parsed, const std::string& fileName);
+    // The folder relative file names are taken from: the file's, or the current one for a
+    // setup not yet saved.
+    std::string NamesFolder() const;
+    std::string ToText(const std::string& fromFolder, const std::string& toFolder);
     CZoSEKivBase* OwnerOf(std::string_view sectionName);
     // Reports what loading passed over: content no node read, a module section that is
     // missing or repeated.

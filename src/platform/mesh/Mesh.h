@@ -29,18 +29,29 @@ public:
     std::vector<MeshBoundary> boundaries;
     // The projection the file states (a registry string), empty when it says none.
     std::string projection;
+    // The UGRID topology read (empty for .2dm).
+    std::string topology;
+    // What reading passed over, converted or did not find, one sentence each.
+    std::vector<std::string> notes;
+    // Nodes without a bed level (fill values, or none in the file): z is 0 there and left out
+    // of the extent. Empty when every node has one.
+    std::vector<char> zMissing;
 
     size_t NodeCount() const { return x.size(); }
     size_t ElementCount() const { return elements.size(); }
     size_t TriangleCount() const;
     size_t QuadrilateralCount() const { return ElementCount() - TriangleCount(); }
     static int Corners(const Element& e) { return e[3] < 0 ? 3 : 4; }
+    bool BedLevelMissing(size_t node) const { return !zMissing.empty() && zMissing[node]; }
+    size_t MissingBedLevelCount() const { return m_missing; }
+    bool HasBedLevel() const { return MissingBedLevelCount() < NodeCount(); }
     // Computed once when the mesh is complete (Finish).
     const MeshExtent& Extent() const { return m_extent; }
     void Finish();
 
 private:
     MeshExtent m_extent;
+    size_t m_missing = 0;
 };
 
 using MeshPtr = std::shared_ptr<const CMesh>;

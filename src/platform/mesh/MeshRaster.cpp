@@ -42,10 +42,13 @@ std::vector<uint32_t> ElementColours(const CMesh& mesh) {
     for (size_t e = 0; e < c.size(); ++e) {
         const CMesh::Element& el = mesh.elements[e];
         double z = 0;
+        bool missing = false;
         const int n = CMesh::Corners(el);
-        for (int i = 0; i < n; ++i)
+        for (int i = 0; i < n; ++i) {
             z += mesh.z[static_cast<size_t>(el[i])];
-        c[e] = BedLevelColour(z / n, ext.zMin, ext.zMax);
+            missing = missing || mesh.BedLevelMissing(static_cast<size_t>(el[i]));
+        }
+        c[e] = missing ? kNoBedLevelColour : BedLevelColour(z / n, ext.zMin, ext.zMax);
     }
     return c;
 }

@@ -9,7 +9,9 @@
 
 // Colours of bed levels, from deep water to dry land.
 uint32_t BedLevelColour(double z, double zMin, double zMax);
-// One colour per element from the mean bed level of its nodes.
+// Elements with a node whose bed level is missing.
+constexpr uint32_t kNoBedLevelColour = 0xffc8c8c8u;
+// One colour per element from the mean bed level of its nodes; no data where any is missing.
 std::vector<uint32_t> ElementColours(const CMesh& mesh);
 
 struct RasterView {

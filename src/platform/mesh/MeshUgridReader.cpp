@@ -1,18 +1,22 @@
-// UGRID netCDF: the variable with cf_role = "mesh_topology" names the node coordinates and
-// the face-node connectivity (triangles and quadrilaterals, start_index 0 or 1, _FillValue
-// for the missing fourth node). Bed levels come from a node variable of the mesh whose
-// standard_name is "altitude" (or a sea-floor depth, positive down). Open boundaries come
-// from boundary_node_connectivity together with a boundary variable of the mesh holding
-// one code per edge; its flag_values and flag_meanings give the boundaries' names. Codes 0
-// and 1 are land. The projection comes from the coordinates' grid_mapping (epsg_code) or
-// from longitude/latitude standard names.
+// UGRID netCDF: the variable with cf_role = "mesh_topology" and topology_dimension 2 names
+// the node coordinates and the face-node connectivity (triangles and quadrilaterals, in
+// either layout, start_index 0 or 1, fill values for the missing fourth node). x and y are
+// told apart by standard_name, units or axis. The bed level is a node variable of the mesh
+// recognised by standard_name or by the names tools use; its fill values are missing
+// levels. Open boundaries come from boundary_node_connectivity together with a boundary
+// variable of the mesh holding one code per edge; its flag_values and flag_meanings give
+// the boundaries' names. Codes 0 and 1 are land. The projection comes from a grid_mapping
+// on any variable of the mesh, or from geographical coordinates.
 #include "MeshReader.h"
 #include "projection/ZoMapProjection.h"
 
 #include <netcdf.h>
 
 #include <algorithm>
+#include <cctype>
 #include <cmath>
+#include <cstdlib>
+#include <iomanip>
 #include <map>
 #include <new>
 #include <sstream>
@@ -22,6 +26,8 @@ namespace {
 // A dimension of a netCDF-4 file can claim far more than the file holds; nothing is
 // allocated beyond this (about 33 million nodes or elements).
 constexpr size_t kMaxCount = size_t(1) << 25;
+// Wider face tables than this are not read at all.
+constexpr size_t kMaxFaceColumns = 64;
 
 struct Fail {
     std::string message;
@@ -52,40 +58,62 @@ public:
             s.pop_back();
         return s;
     }
-    bool IntAtt(int var, const char* name, long long& v) const {
-        nc_type type;
-        size_t len = 0;
-        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || len != 1 || type == NC_CHAR)
-            return false;
-        return nc_get_att_longlong(m_id, var, name, &v) == NC_NOERR;
+    bool HasAtt(int var, const char* name) const {
+        return nc_inq_attid(m_id, var, name, nullptr) == NC_NOERR;
     }
-    std::vector<long long> IntsAtt(int var, const char* name) const {
+    // Numeric attributes of any type, floats included.
+    std::vector<double> NumbersAtt(int var, const char* name) const {
         nc_type type;
         size_t len = 0;
-        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type == NC_CHAR || len > 100000)
+        if (nc_inq_att(m_id, var, name, &type, &len) != NC_NOERR || type == NC_CHAR ||
+            type == NC_STRING || len == 0 || len > 100000)
             return {};
-        std::vector<long long> v(len);
-        if (nc_get_att_longlong(m_id, var, name, v.data()) != NC_NOERR)
+        std::vector<double> v(len);
+        if (nc_get_att_double(m_id, var, name, v.data()) != NC_NOERR)
             return {};
         return v;
     }
+    bool NumberAtt(int var, const char* name, double& v) const {
+        const std::vector<double> n = NumbersAtt(var, name);
+        if (n.size() != 1)
+            return false;
+        v = n[0];
+        return true;
+    }
     int Var(const std::string& name) const {
         int v = -1;
-        return nc_inq_varid(m_id, name.c_str(), &v) == NC_NOERR ? v : -1;
+        return !name.empty() && nc_inq_varid(m_id, name.c_str(), &v) == NC_NOERR ? v : -1;
     }
-    std::vector<size_t> Shape(int var) const {
+    int Dim(const std::string& name) const {
+        int d = -1;
+        return !name.empty() && nc_inq_dimid(m_id, name.c_str(), &d) == NC_NOERR ? d : -1;
+    }
+    nc_type Type(int var) const {
+        nc_type t = NC_NAT;
+        nc_inq_vartype(m_id, var, &t);
+        return t;
+    }
+    std::vector<int> Dims(int var) const {
         int nd = 0;
         if (nc_inq_varndims(m_id, var, &nd) != NC_NOERR || nd < 0 || nd > NC_MAX_VAR_DIMS)
             return {};
         std::vector<int> dims(static_cast<size_t>(nd));
         nc_inq_vardimid(m_id, var, dims.data());
+        return dims;
+    }
+    std::vector<size_t> Shape(int var) const {
         std::vector<size_t> shape;
-        for (int d : dims) {
+        for (int d : Dims(var)) {
             size_t len = 0;
             nc_inq_dimlen(m_id, d, &len);
             shape.push_back(len);
         }
         return shape;
+    }
+    std::string DimName(int dim) const {
+        char name[NC_MAX_NAME + 1] = {};
+        nc_inq_dimname(m_id, dim, name);
+        return name;
     }
     std::string Name(int var) const {
         char name[NC_MAX_NAME + 1] = {};
@@ -112,77 +140,187 @@ std::vector<std::string> Words(const std::string& s) {
     return w;
 }
 
+std::string Lower(std::string s) {
+    for (char& c : s)
+        c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+    return s;
+}
+
 void Check(int status, const std::string& what) {
     if (status != NC_NOERR)
         throw Fail{what + ": " + nc_strerror(status)};
 }
 
-std::vector<double> Doubles(const File& f, int var, size_t n, const std::string& what) {
+double DefaultFill(nc_type t) {
+    switch (t) {
+    case NC_BYTE:
+        return NC_FILL_BYTE;
+    case NC_UBYTE:
+        return NC_FILL_UBYTE;
+    case NC_SHORT:
+        return NC_FILL_SHORT;
+    case NC_USHORT:
+        return NC_FILL_USHORT;
+    case NC_INT:
+        return NC_FILL_INT;
+    case NC_UINT:
+        return NC_FILL_UINT;
+    case NC_INT64:
+        return static_cast<double>(NC_FILL_INT64);
+    case NC_UINT64:
+        return static_cast<double>(NC_FILL_UINT64);
+    case NC_FLOAT:
+        return NC_FILL_FLOAT;
+    default:
+        return NC_FILL_DOUBLE;
+    }
+}
+
+// The values of a variable that stand for no value: its _FillValue (else the type's
+// default fill), its missing_value, and anything that is not a finite number.
+struct NoValue {
+    std::vector<double> values;
+    bool declared = false; // _FillValue or missing_value given
+    bool operator()(double v) const {
+        return !std::isfinite(v) || std::find(values.begin(), values.end(), v) != values.end();
+    }
+};
+
+NoValue NoValues(const File& f, int var) {
+    NoValue n;
+    n.values = f.NumbersAtt(var, "_FillValue");
+    n.declared = !n.values.empty();
+    if (n.values.empty())
+        n.values.push_back(DefaultFill(f.Type(var)));
+    const std::vector<double> missing = f.NumbersAtt(var, "missing_value");
+    n.declared = n.declared || !missing.empty();
+    n.values.insert(n.values.end(), missing.begin(), missing.end());
+    return n;
+}
+
+std::vector<double> Coordinates(const File& f, int var, size_t n, const std::string& what) {
     const std::vector<size_t> shape = f.Shape(var);
     if (shape.size() != 1 || shape[0] != n)
         throw Fail{what + " must be one value per node"};
     std::vector<double> v(n);
     if (n)
         Check(nc_get_var_double(f.Id(), var, v.data()), what);
+    const NoValue none = NoValues(f, var);
     for (double d : v)
-        if (!std::isfinite(d))
-            throw Fail{what + " holds a value that is not a number"};
+        if (none(d))
+            throw Fail{what + " holds a fill value or a value that is not a number"};
     return v;
 }
 
-int TopologyVariable(const File& f) {
+struct Topology {
+    int var = -1;
+    std::string name;
+};
+
+// The 2D topology; any others are named in a note.
+Topology FindTopology(const File& f, std::vector<std::string>& notes) {
+    std::vector<std::pair<int, long long>> all;
     for (int v = 0; v < f.VarCount(); ++v)
         if (f.TextAtt(v, "cf_role") == "mesh_topology") {
-            long long dim = 2;
-            f.IntAtt(v, "topology_dimension", dim);
-            if (dim == 2)
-                return v;
+            double dim = 2;
+            f.NumberAtt(v, "topology_dimension", dim);
+            all.push_back({v, std::isfinite(dim) && std::fabs(dim) < 1e9 ? std::llround(dim) : 0});
         }
-    throw Fail{
-        "no variable with cf_role = \"mesh_topology\" and topology_dimension 2 (not a UGRID mesh)"};
+    if (all.empty())
+        throw Fail{"no variable with cf_role = \"mesh_topology\" (not a UGRID mesh)"};
+    Topology t;
+    for (const auto& [v, dim] : all)
+        if (dim == 2 && (t.var < 0 || (!f.HasAtt(t.var, "face_node_connectivity") &&
+                                       f.HasAtt(v, "face_node_connectivity"))))
+            t = {v, f.Name(v)};
+    std::string others;
+    for (const auto& [v, dim] : all)
+        if (v != t.var)
+            others += (others.empty() ? "" : ", ") + f.Name(v) + " (" + std::to_string(dim) + "D)";
+    if (t.var < 0)
+        throw Fail{"no 2D mesh topology (only " + others + ")"};
+    if (!others.empty())
+        notes.push_back("2D topology " + t.name + " taken; passed over: " + others);
+    return t;
 }
 
-// Node indices from 0 in an edge or face table, with the fill value as -1.
-std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t columns,
+// Node indices from 0 in an edge (columns 2) or face (columns 0: 3 or 4 nodes) table, four
+// a row with -1 for none. faceDim, when known, tells which dimension counts the rows.
+std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t columns, int faceDim,
                               const std::string& what, size_t& rows) {
+    const char* const row = columns == 2 ? "edge" : "face";
     const std::vector<size_t> shape = f.Shape(var);
-    if (shape.size() != 2 || (columns && shape[1] != columns) || shape[1] < 3 - (columns == 2) ||
-        shape[1] > 4)
-        throw Fail{what + " must have " +
-                   (columns == 2 ? std::string("two nodes") : std::string("3 or 4 nodes")) +
-                   " a row"};
-    rows = shape[0];
-    if (rows > kMaxCount)
-        throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
-    std::vector<long long> raw(rows * shape[1]);
-    if (!raw.empty())
-        Check(nc_get_var_longlong(f.Id(), var, raw.data()), what);
-    long long start = 0, fill = NC_FILL_INT;
-    f.IntAtt(var, "start_index", start);
-    const bool hasFill = f.IntAtt(var, "_FillValue", fill);
-    std::vector<int> out(rows * 4, -1);
-    for (size_t r = 0; r < rows; ++r) {
-        int valid = 0;
-        for (size_t c = 0; c < shape[1]; ++c) {
-            const long long v = raw[r * shape[1] + c];
-            if ((hasFill && v == fill) || (!hasFill && v == NC_FILL_INT) || v < start) {
-                continue;
-            }
-            const long long index = v - start;
-            if (index >= static_cast<long long>(nodes))
-                throw Fail{what + " row " + std::to_string(r + 1) + " names node " +
-                           std::to_string(v) + ", which does not exist"};
-            out[r * 4 + static_cast<size_t>(valid++)] = static_cast<int>(index);
-        }
-        const int need = columns == 2 ? 2 : 3;
-        if (valid < need)
-            throw Fail{what + " row " + std::to_string(r + 1) + " has fewer than " +
-                       std::to_string(need) + " nodes"};
-        for (int i = 0; i < valid; ++i)
-            for (int j = 0; j < i; ++j)
-                if (out[r * 4 + i] == out[r * 4 + j])
-                    throw Fail{what + " row " + std::to_string(r + 1) + " names a node twice"};
+    const std::vector<int> dims = f.Dims(var);
+    if (shape.size() != 2)
+        throw Fail{what + " must be a table of two dimensions"};
+    // The older layout puts the nodes of a row first.
+    bool transposed;
+    if (faceDim >= 0 && columns != 2)
+        transposed = dims[1] == faceDim && dims[0] != faceDim;
+    else if (columns == 2)
+        transposed = shape[0] == 2 && shape[1] != 2;
+    else {
+        // A first dimension named as the nodes of a face ("nMaxMesh2_face_nodes"), or 3 or
+        // 4 long against more faces, puts the nodes first.
+        const bool max0 = Lower(f.DimName(dims[0])).find("max") != std::string::npos;
+        const bool max1 = Lower(f.DimName(dims[1])).find("max") != std::string::npos;
+        transposed = max0 != max1 ? max0 : (shape[0] == 3 || shape[0] == 4) && shape[1] > 4;
     }
+    rows = shape[transposed ? 1 : 0];
+    const size_t width = shape[transposed ? 0 : 1];
+    if (columns == 2 && width != 2)
+        throw Fail{what + " must have two nodes an edge"};
+    if (columns != 2 && width > kMaxFaceColumns)
+        throw Fail{what + ": faces of up to " + std::to_string(width) +
+                   " nodes: the flow model takes triangles and quadrilaterals"};
+    if (rows > kMaxCount || rows * width > 4 * kMaxCount)
+        throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
+    // Read as doubles: any integer type, and floating tables with NaN as fill, alike.
+    std::vector<double> raw(rows * width);
+    if (!raw.empty())
+        Check(nc_get_var_double(f.Id(), var, raw.data()), what);
+    double start = 0;
+    f.NumberAtt(var, "start_index", start);
+    if (!(start >= 0 && start <= 1e9) || start != std::floor(start))
+        throw Fail{what + ": start_index is not a whole number from 0"};
+    const NoValue none = NoValues(f, var);
+    std::vector<int> out(rows * 4, -1);
+    size_t widest = 0, widestRow = 0;
+    for (size_t r = 0; r < rows; ++r) {
+        size_t valid = 0;
+        for (size_t c = 0; c < width; ++c) {
+            const double v = raw[transposed ? c * rows + r : r * width + c];
+            // Tables without a declared fill mark the missing nodes by negative numbers.
+            if (none(v) || (!none.declared && v < 0))
+                continue;
+            const double index = v - start;
+            if (v != std::floor(v) || index < 0 || index >= static_cast<double>(nodes)) {
+                std::ostringstream text;
+                text << std::setprecision(17) << what << ": " << row << " " << r + 1
+                     << " names node " << v << ", which does not exist (nodes " << start << " to "
+                     << start + static_cast<double>(nodes) - 1 << ")";
+                throw Fail{text.str()};
+            }
+            if (valid < 4)
+                out[r * 4 + valid] = static_cast<int>(index);
+            ++valid;
+        }
+        if (valid > widest)
+            widest = valid, widestRow = r;
+        const size_t need = columns == 2 ? 2 : 3;
+        if (valid < need)
+            throw Fail{what + ": " + row + " " + std::to_string(r + 1) + " has fewer than " +
+                       std::to_string(need) + " nodes"};
+        for (size_t i = 0; i < std::min<size_t>(valid, 4); ++i)
+            for (size_t j = 0; j < i; ++j)
+                if (out[r * 4 + i] == out[r * 4 + j])
+                    throw Fail{what + ": " + row + " " + std::to_string(r + 1) +
+                               " names a node twice"};
+    }
+    if (widest > 4)
+        throw Fail{what + ": faces of up to " + std::to_string(widest) +
+                   " nodes: the flow model takes triangles and quadrilaterals (face " +
+                   std::to_string(widestRow + 1) + ")"};
     return out;
 }
 
@@ -219,22 +357,25 @@ std::vector<int> Chain(const std::vector<std::pair<int, int>>& edges, int code) 
     return line;
 }
 
-void ReadBoundaries(const File& f, int topo, const std::string& topoName, CMesh& mesh) {
-    const std::string connName = f.TextAtt(topo, "boundary_node_connectivity");
+void ReadBoundaries(const File& f, const Topology& topo, CMesh& mesh) {
+    const std::string connName = f.TextAtt(topo.var, "boundary_node_connectivity");
     if (connName.empty())
         return;
     const int conn = f.Var(connName);
     if (conn < 0)
         throw Fail{"boundary_node_connectivity names " + connName + ", which does not exist"};
     size_t rows = 0;
-    const std::vector<int> edges = Connectivity(f, conn, mesh.NodeCount(), 2, connName, rows);
+    const std::vector<int> edges = Connectivity(f, conn, mesh.NodeCount(), 2, -1, connName, rows);
     int codesVar = -1;
     for (int v = 0; v < f.VarCount() && codesVar < 0; ++v)
-        if (f.TextAtt(v, "mesh") == topoName && f.TextAtt(v, "location") == "boundary")
+        if (f.TextAtt(v, "mesh") == topo.name && f.TextAtt(v, "location") == "boundary")
             codesVar = v;
     // Without codes the edges cannot be told apart from the land boundary.
-    if (codesVar < 0)
+    if (codesVar < 0) {
+        mesh.notes.push_back(connName +
+                             " passed over: no boundary variable gives the edges' codes");
         return;
+    }
     const std::vector<size_t> shape = f.Shape(codesVar);
     if (shape.size() != 1 || shape[0] != rows)
         throw Fail{f.Name(codesVar) + " must hold one code per boundary edge"};
@@ -242,12 +383,13 @@ void ReadBoundaries(const File& f, int topo, const std::string& topoName, CMesh&
     if (rows)
         Check(nc_get_var_int(f.Id(), codesVar, codes.data()), f.Name(codesVar));
     std::map<int, std::string> names;
-    const std::vector<long long> values = f.IntsAtt(codesVar, "flag_values");
+    const std::vector<double> values = f.NumbersAtt(codesVar, "flag_values");
     const std::vector<std::string> meanings = Words(f.TextAtt(codesVar, "flag_meanings"));
     for (size_t i = 0; i < values.size() && i < meanings.size(); ++i) {
         std::string n = meanings[i];
         std::replace(n.begin(), n.end(), '_', ' ');
-        names[static_cast<int>(values[i])] = n;
+        if (std::isfinite(values[i]) && std::fabs(values[i]) < 1e9)
+            names[static_cast<int>(values[i])] = n;
     }
     std::map<int, std::vector<std::pair<int, int>>> byCode;
     for (size_t r = 0; r < rows; ++r)
@@ -263,22 +405,216 @@ void ReadBoundaries(const File& f, int topo, const std::string& topoName, CMesh&
     }
 }
 
-std::string Projection(const File& f, int xVar) {
-    if (f.TextAtt(xVar, "standard_name") == "longitude")
+// 'x' or 'y' for a coordinate that says which it is, else 0; geographical tells degrees.
+char Axis(const File& f, int var, bool* geographical = nullptr) {
+    const std::string sn = f.TextAtt(var, "standard_name");
+    const std::string units = Lower(f.TextAtt(var, "units"));
+    const auto is = [&](const char* a, const char* b) { return sn == a || sn == b; };
+    const auto unitsOf = [&](const std::string& end) {
+        for (const char* d : {"degrees_", "degree_", "degrees", "degree"})
+            if (units == d + end || units == d + end.substr(0, 1))
+                return true;
+        return false;
+    };
+    char axis = 0;
+    bool geo = false;
+    if (is("longitude", "grid_longitude") || (sn.empty() && unitsOf("east")))
+        axis = 'x', geo = true;
+    else if (is("latitude", "grid_latitude") || (sn.empty() && unitsOf("north")))
+        axis = 'y', geo = true;
+    else if (sn == "projection_x_coordinate")
+        axis = 'x';
+    else if (sn == "projection_y_coordinate")
+        axis = 'y';
+    else if (sn.empty()) {
+        const std::string a = Lower(f.TextAtt(var, "axis"));
+        axis = a == "x" ? 'x' : a == "y" ? 'y' : 0;
+    }
+    if (geographical)
+        *geographical = geo;
+    return axis;
+}
+
+// The two node coordinates, x first, whatever order node_coordinates lists them in; from
+// several pairs the projected one.
+std::pair<std::string, std::string> NodeCoordinates(const File& f, const Topology& topo,
+                                                    std::vector<std::string>& notes) {
+    const std::vector<std::string> coords = Words(f.TextAtt(topo.var, "node_coordinates"));
+    if (coords.size() < 2)
+        throw Fail{topo.name + ": node_coordinates must name two variables"};
+    for (const std::string& c : coords)
+        if (f.Var(c) < 0)
+            throw Fail{topo.name + ": node coordinate " + c + " does not exist"};
+    std::string x, y, gx, gy;
+    for (const std::string& c : coords) {
+        bool geo = false;
+        const char a = Axis(f, f.Var(c), &geo);
+        if (a == 0)
+            continue;
+        std::string& slot = a == 'x' ? (geo ? gx : x) : (geo ? gy : y);
+        if (slot.empty())
+            slot = c;
+    }
+    if (x.empty() || y.empty())
+        x = gx, y = gy;
+    if (x.empty() || y.empty()) {
+        // Nothing says which is which: the order of node_coordinates.
+        x = coords[0], y = coords[1];
+        if (Axis(f, f.Var(x)) == 'y' || Axis(f, f.Var(y)) == 'x')
+            std::swap(x, y);
+    }
+    if (x == coords[1] && y == coords[0])
+        notes.push_back("node_coordinates lists y first: x is " + x + ", y is " + y);
+    if (coords.size() > 2)
+        notes.push_back("node coordinates " + x + " and " + y + " taken of " +
+                        std::to_string(coords.size()));
+    return {x, y};
+}
+
+// The bed level: a node variable of the mesh by standard_name, else by the names tools use;
+// depths are turned into levels. Fill values are missing levels.
+void ReadBedLevel(const File& f, const Topology& topo, int nodeDim, CMesh& mesh) {
+    static const char* const kUp[] = {"altitude",           "height_above_mean_sea_level",
+                                      "height_above_geoid", "height_above_reference_ellipsoid",
+                                      "surface_altitude",   "bed_altitude"};
+    static const char* const kNamesUp[] = {"mesh2d_node_z", "netnode_z", "node_z", "elevation",
+                                           "bed_level"};
+    static const char* const kNamesDown[] = {"depth", "bathymetry", "bottom_depth"};
+    const size_t n = mesh.NodeCount();
+    int best = -1, bestRank = 9;
+    bool down = false;
+    for (int v = 0; v < f.VarCount(); ++v) {
+        const std::vector<int> dims = f.Dims(v);
+        const nc_type type = f.Type(v);
+        if (dims.size() != 1 || dims[0] != nodeDim || type == NC_CHAR || type < NC_BYTE ||
+            type > NC_UINT64)
+            continue;
+        const std::string mesh_ = f.TextAtt(v, "mesh"), location = f.TextAtt(v, "location");
+        if (!mesh_.empty() && mesh_ != topo.name)
+            continue;
+        if (!location.empty() && location != "node")
+            continue;
+        const std::string sn = f.TextAtt(v, "standard_name");
+        const std::string name = Lower(f.Name(v));
+        int rank = 9;
+        bool isDepth = false;
+        if (std::find(std::begin(kUp), std::end(kUp), sn) != std::end(kUp))
+            rank = 0;
+        else if (sn.rfind("sea_floor_depth", 0) == 0 || sn == "depth")
+            rank = 0, isDepth = true;
+        else if (!sn.empty())
+            continue; // a quantity of its own
+        else if (std::find(std::begin(kNamesUp), std::end(kNamesUp), name) != std::end(kNamesUp) ||
+                 name == Lower(topo.name) + "_node_z")
+            rank = 1;
+        else if (std::find(std::begin(kNamesDown), std::end(kNamesDown), name) !=
+                 std::end(kNamesDown))
+            rank = 1, isDepth = true;
+        // Among equals, the variable that says it belongs to the mesh.
+        if (rank < 9 && mesh_.empty())
+            rank += 2;
+        if (rank >= bestRank)
+            continue;
+        const std::string positive = Lower(f.TextAtt(v, "positive"));
+        best = v, bestRank = rank;
+        down = positive == "down" || (positive != "up" && isDepth);
+    }
+    mesh.z.assign(n, 0.0);
+    if (best < 0) {
+        mesh.zMissing.assign(n, 1);
+        mesh.notes.push_back("bed level: none found (no node variable of the mesh is a bed "
+                             "level or a depth)");
+        return;
+    }
+    const std::string what = f.Name(best);
+    Check(nc_get_var_double(f.Id(), best, mesh.z.data()), what);
+    const NoValue none = NoValues(f, best);
+    double scale = 1, offset = 0;
+    f.NumberAtt(best, "scale_factor", scale);
+    f.NumberAtt(best, "add_offset", offset);
+    size_t missing = 0;
+    std::vector<char> flags(n, 0);
+    for (size_t i = 0; i < n; ++i) {
+        double& z = mesh.z[i];
+        if (none(z)) {
+            flags[i] = 1, z = 0, ++missing;
+            continue;
+        }
+        z = z * scale + offset;
+        if (down)
+            z = -z;
+        if (!std::isfinite(z))
+            flags[i] = 1, z = 0, ++missing;
+    }
+    if (missing) {
+        mesh.zMissing = std::move(flags);
+        mesh.notes.push_back("bed level missing on " + std::to_string(missing) + " of " +
+                             std::to_string(n) + " nodes (fill values in " + what + ")");
+    }
+}
+
+// The projection from a grid_mapping variable: an EPSG code in one of the attributes tools
+// use, else a definition that PROJ can identify.
+std::string ProjectionOf(const File& f, int crs, std::vector<std::string>& notes) {
+    const std::string crsName = f.Name(crs);
+    for (const char* att : {"epsg", "EPSG_code", "epsg_code"}) {
+        std::string code = f.TextAtt(crs, att);
+        double number = 0;
+        if (code.empty() && f.NumberAtt(crs, att, number) && number > 0 && number < 1e9)
+            code = std::to_string(std::llround(number));
+        if (Lower(code).rfind("epsg:", 0) == 0)
+            code = code.substr(5);
+        if (code.empty())
+            continue;
+        const long long epsg = std::strtoll(code.c_str(), nullptr, 10);
+        const std::string p = epsg > 0 && epsg < INT32_MAX
+                                  ? CZoMapProjection::FromEpsg(static_cast<int>(epsg))
+                                  : std::string();
+        if (p.empty())
+            notes.push_back("projection " + crsName + ":" + att + " = \"" + code +
+                            "\" is not a known EPSG code; none taken");
+        return p;
+    }
+    for (const char* att : {"crs_wkt", "spatial_ref", "proj4_params", "proj4"}) {
+        const std::string def = f.TextAtt(crs, att);
+        if (def.empty())
+            continue;
+        const int epsg = CZoMapProjection::EpsgOfDefinition(def);
+        const std::string p = epsg > 0 ? CZoMapProjection::FromEpsg(epsg) : std::string();
+        if (p.empty())
+            notes.push_back("projection " + crsName + ":" + att +
+                            " matches no EPSG code; none taken");
+        return p;
+    }
+    if (f.TextAtt(crs, "grid_mapping_name") == "latitude_longitude")
         return "LONG/LAT";
-    const int crs = f.Var(f.TextAtt(xVar, "grid_mapping"));
-    if (crs < 0)
-        return {};
-    long long epsg = 0;
-    std::string code = f.TextAtt(crs, "epsg_code");
-    if (code.rfind("EPSG:", 0) == 0)
-        code = code.substr(5);
-    if (!code.empty())
-        epsg = std::atoll(code.c_str());
-    else
-        f.IntAtt(crs, "epsg", epsg);
-    return epsg > 0 && epsg < INT32_MAX ? CZoMapProjection::FromEpsg(static_cast<int>(epsg))
-                                        : std::string();
+    return {};
+}
+
+std::string Projection(const File& f, const Topology& topo, const std::string& xName,
+                       const std::string& yName, std::vector<std::string>& notes) {
+    bool geographical = false;
+    Axis(f, f.Var(xName), &geographical);
+    if (geographical)
+        return "LONG/LAT";
+    // The coordinates first, then the topology, then every variable of the mesh.
+    std::vector<int> vars{f.Var(xName), f.Var(yName), topo.var};
+    for (int v = 0; v < f.VarCount(); ++v)
+        if (f.TextAtt(v, "mesh") == topo.name)
+            vars.push_back(v);
+    for (int v : vars) {
+        // "crs" or the extended form "crs: x y".
+        std::vector<std::string> words = Words(f.TextAtt(v, "grid_mapping"));
+        if (words.empty())
+            continue;
+        std::string name = words[0];
+        if (name.size() > 1 && name.back() == ':')
+            name.pop_back();
+        const int crs = f.Var(name);
+        if (crs >= 0)
+            return ProjectionOf(f, crs, notes);
+    }
+    return {};
 }
 
 } // namespace
@@ -289,53 +625,35 @@ MeshReadResult ReadUgrid(const std::string& path) {
         return {nullptr, path + ": " + nc_strerror(f.Status())};
     try {
         auto mesh = std::make_shared<CMesh>();
-        const int topo = TopologyVariable(f);
-        const std::string topoName = f.Name(topo);
-        const std::vector<std::string> coords = Words(f.TextAtt(topo, "node_coordinates"));
-        if (coords.size() != 2)
-            throw Fail{topoName + ": node_coordinates must name two variables"};
-        const int xVar = f.Var(coords[0]), yVar = f.Var(coords[1]);
-        if (xVar < 0 || yVar < 0)
-            throw Fail{topoName + ": node coordinate " + coords[xVar < 0 ? 0 : 1] +
-                       " does not exist"};
+        const Topology topo = FindTopology(f, mesh->notes);
+        mesh->topology = topo.name;
+        const auto [xName, yName] = NodeCoordinates(f, topo, mesh->notes);
+        const int xVar = f.Var(xName), yVar = f.Var(yName);
         const std::vector<size_t> xShape = f.Shape(xVar);
         if (xShape.size() != 1 || xShape[0] == 0)
-            throw Fail{"no nodes in " + coords[0]};
+            throw Fail{"no nodes in " + xName};
         const size_t n = xShape[0];
         if (n > kMaxCount)
             throw Fail{"more nodes than can be read (" + std::to_string(n) + ")"};
-        mesh->x = Doubles(f, xVar, n, coords[0]);
-        mesh->y = Doubles(f, yVar, n, coords[1]);
-        mesh->z.assign(n, 0.0);
-        for (int v = 0; v < f.VarCount(); ++v) {
-            if (f.TextAtt(v, "mesh") != topoName || f.TextAtt(v, "location") != "node")
-                continue;
-            const std::string sn = f.TextAtt(v, "standard_name");
-            const bool down =
-                f.TextAtt(v, "positive") == "down" || sn.rfind("sea_floor_depth", 0) == 0;
-            if (sn != "altitude" && sn.rfind("sea_floor_depth", 0) != 0)
-                continue;
-            mesh->z = Doubles(f, v, n, f.Name(v));
-            if (down)
-                for (double& z : mesh->z)
-                    z = -z;
-            break;
-        }
-        const std::string facesName = f.TextAtt(topo, "face_node_connectivity");
+        mesh->x = Coordinates(f, xVar, n, xName);
+        mesh->y = Coordinates(f, yVar, n, yName);
+        ReadBedLevel(f, topo, f.Dims(xVar)[0], *mesh);
+        const std::string facesName = f.TextAtt(topo.var, "face_node_connectivity");
+        if (facesName.empty())
+            throw Fail{topo.name + ": a 2D topology without faces (no face_node_connectivity)"};
         const int faces = f.Var(facesName);
         if (faces < 0)
-            throw Fail{
-                topoName + ": face_node_connectivity " +
-                (facesName.empty() ? std::string("missing") : facesName + " does not exist")};
+            throw Fail{topo.name + ": face_node_connectivity " + facesName + " does not exist"};
         size_t rows = 0;
-        const std::vector<int> table = Connectivity(f, faces, n, 0, facesName, rows);
+        const int faceDim = f.Dim(f.TextAtt(topo.var, "face_dimension"));
+        const std::vector<int> table = Connectivity(f, faces, n, 0, faceDim, facesName, rows);
         if (rows == 0)
             throw Fail{"no elements in " + facesName};
         mesh->elements.resize(rows);
         for (size_t r = 0; r < rows; ++r)
             std::copy_n(table.begin() + static_cast<long>(r * 4), 4, mesh->elements[r].begin());
-        ReadBoundaries(f, topo, topoName, *mesh);
-        mesh->projection = Projection(f, xVar);
+        ReadBoundaries(f, topo, *mesh);
+        mesh->projection = Projection(f, topo, xName, yName, mesh->notes);
         mesh->Finish();
         return {std::move(mesh), {}};
     } catch (const Fail& e) {

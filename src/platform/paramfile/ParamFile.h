@@ -12,6 +12,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -205,6 +206,9 @@ public:
     void AddBool(bool v);
     void AddString(std::string_view v);
     void AddFileName(std::string_view v);
+    // File names added from now on, copied ones too, are stored as map gives them (a setup
+    // saved into another folder names the same files from there).
+    void MapFileNames(std::function<std::string(std::string_view)> map);
     // Deep copy of a section of another (or this) document into the current section, with
     // its comments.
     void CopySection(const Section& section);

@@ -4,6 +4,7 @@
 
 #include <charconv>
 #include <cmath>
+#include <cstdlib>
 #include <map>
 
 namespace {
@@ -125,6 +126,35 @@ std::string CZoMapProjection::FromEpsg(int epsg) {
         if (e.epsg == epsg)
             return e.name;
     return epsg > 0 && Describe(epsg, nullptr) ? "EPSG:" + std::to_string(epsg) : std::string();
+}
+
+int CZoMapProjection::EpsgOfDefinition(const std::string& definition) {
+    PJ_CONTEXT* ctx = Ctx().ctx;
+    PJ* crs = proj_create(ctx, definition.c_str());
+    int epsg = 0;
+    if (crs) {
+        const char* auth = proj_get_id_auth_name(crs, 0);
+        const char* code = proj_get_id_code(crs, 0);
+        if (auth && code && std::string(auth) == "EPSG") {
+            epsg = std::atoi(code);
+        } else {
+            int* confidence = nullptr;
+            // 70 and above: PROJ's "likely" match; the best comes first.
+            if (PJ_OBJ_LIST* list = proj_identify(ctx, crs, "EPSG", nullptr, &confidence)) {
+                if (proj_list_get_count(list) > 0 && confidence[0] >= 70) {
+                    PJ* match = proj_list_get(ctx, list, 0);
+                    if (const char* c = match ? proj_get_id_code(match, 0) : nullptr)
+                        epsg = std::atoi(c);
+                    proj_destroy(match);
+                }
+                proj_int_list_destroy(confidence);
+                proj_list_destroy(list);
+            }
+        }
+        proj_destroy(crs);
+    }
+    proj_errno_reset(nullptr);
+    return epsg > 0 ? epsg : 0;
 }
 
 CZoMapProjection::CZoMapProjection(const std::string& from, const std::string& to) {

@@ -35,6 +35,9 @@ public:
     // The registry string for an EPSG code: a registered name where there is one, else
     // "EPSG:n"; empty when PROJ does not know the code.
     static std::string FromEpsg(int epsg);
+    // The EPSG code of a definition (WKT, PROJ string, "EPSG:n") that names one or that PROJ
+    // identifies as likely; 0 when none.
+    static int EpsgOfDefinition(const std::string& definition);
 
     // A transform from one projection to another; IsValid is false when either is unknown.
     CZoMapProjection(const std::string& from, const std::string& to);

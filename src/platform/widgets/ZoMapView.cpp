@@ -365,15 +365,17 @@ void CZoMapView::DrawLegend(QPainter& p) {
     if (!m_mesh || m_mesh->NodeCount() == 0)
         return;
     const MeshExtent& e = m_mesh->Extent();
-    const int barH = std::min(100, height() / 3), barW = 12;
+    const bool levels = m_mesh->HasBedLevel(), noData = m_mesh->MissingBedLevelCount() > 0;
     const QFontMetrics fm = p.fontMetrics();
+    const int barH = levels ? std::min(100, height() / 3) : 0, barW = 12;
+    const int noDataH = noData ? fm.height() + 4 : 0;
     const QString top = QString::number(e.zMax, 'f', 1) + " m",
-                  bottom = QString::number(e.zMin, 'f', 1) + " m";
+                  bottom = QString::number(e.zMin, 'f', 1) + " m", none = tr("no data");
     const QString title = tr("Bed level");
-    const int textW = std::max(
-        {fm.horizontalAdvance(top), fm.horizontalAdvance(bottom), fm.horizontalAdvance(title)});
-    const QRect box(width() - textW - barW - 28, height() - barH - fm.height() - 26,
-                    textW + barW + 20, barH + fm.height() + 18);
+    const int textW = std::max({fm.horizontalAdvance(top), fm.horizontalAdvance(bottom),
+                                fm.horizontalAdvance(title), fm.horizontalAdvance(none)});
+    const QRect box(width() - textW - barW - 28, height() - barH - noDataH - fm.height() - 26,
+                    textW + barW + 20, barH + noDataH + fm.height() + 18);
     p.save();
     p.setPen(QColor(0, 0, 0, 60));
     p.setBrush(QColor(255, 255, 255, 210));
@@ -381,12 +383,19 @@ void CZoMapView::DrawLegend(QPainter& p) {
     p.setPen(Qt::black);
     p.drawText(box.left() + 6, box.top() + fm.ascent() + 4, title);
     const int x = box.left() + 6, y0 = box.top() + fm.height() + 10;
-    for (int i = 0; i < barH; ++i) {
-        const double z = e.zMax - (e.zMax - e.zMin) * i / std::max(1, barH - 1);
-        p.fillRect(x, y0 + i, barW, 1, QColor::fromRgba(BedLevelColour(z, e.zMin, e.zMax)));
+    if (levels) {
+        for (int i = 0; i < barH; ++i) {
+            const double z = e.zMax - (e.zMax - e.zMin) * i / std::max(1, barH - 1);
+            p.fillRect(x, y0 + i, barW, 1, QColor::fromRgba(BedLevelColour(z, e.zMin, e.zMax)));
+        }
+        p.drawText(x + barW + 4, y0 + fm.ascent() / 2 + 2, top);
+        p.drawText(x + barW + 4, y0 + barH, bottom);
     }
-    p.drawText(x + barW + 4, y0 + fm.ascent() / 2 + 2, top);
-    p.drawText(x + barW + 4, y0 + barH, bottom);
+    if (noData) {
+        const int y = y0 + barH + (levels ? 4 : 0);
+        p.fillRect(x, y, barW, fm.height() - 2, QColor::fromRgba(kNoBedLevelColour));
+        p.drawText(x + barW + 4, y + fm.ascent() - 1, none);
+    }
     p.restore();
 }
 

@@ -61,8 +61,44 @@ TEST(MeshCli, InfoOfAUgridFile) {
     EXPECT_NE(r.out.find("elements: 2 (2 triangles, 0 quadrilaterals)\nx: 0 to 10\n"),
               std::string::npos)
         << r.out;
-    EXPECT_NE(r.out.find("projection: LONG/LAT\nopen boundaries: 0\n"), std::string::npos) << r.out;
+    // No bed level in the file: said so, not a flat bed at 0 m.
+    EXPECT_NE(r.out.find("topology: Mesh2\n"), std::string::npos) << r.out;
+    EXPECT_NE(r.out.find("y: 0 to 10\nbed level: none found\nprojection: LONG/LAT\n"
+                         "open boundaries: 0\nnotes:\n  bed level: none found"),
+              std::string::npos)
+        << r.out;
     fs::remove(path);
+}
+
+TEST(MeshCli, InfoSaysWhereTheBedLevelIsMissingAndWhatWasPassedOver) {
+    const std::string nc = (fs::temp_directory_path() / "mudsetup-fill.nc").string();
+    testsupport::UgridSpec s;
+    s.x = {0, 10, 10, 0};
+    s.y = {0, 0, 10, 10};
+    s.faces = {0, 1, 2, 0, 2, 3};
+    s.depth = {2, 3, NC_FILL_DOUBLE, 4};
+    Result r;
+    ASSERT_TRUE(testsupport::WriteUgrid(nc, s));
+    r = Mudsetup("mesh info " + nc);
+    EXPECT_EQ(r.exitCode, 0) << r.err;
+    EXPECT_NE(r.out.find("z: -4 to -2\nbed level: missing on 1 of 4 nodes\n"), std::string::npos)
+        << r.out;
+    EXPECT_NE(r.out.find("notes:\n  bed level missing on 1 of 4 nodes (fill values in "
+                         "Mesh2_depth)\n"),
+              std::string::npos)
+        << r.out;
+    fs::remove(nc);
+
+    const fs::path text = fs::temp_directory_path() / "mudsetup-lines.2dm";
+    std::ofstream(text) << "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3 1\n"
+                           "E2L 2 1 2 1\nMAT 1 \"mud\"\n";
+    r = Mudsetup("mesh info " + text.string());
+    EXPECT_EQ(r.exitCode, 0) << r.err;
+    EXPECT_NE(r.out.find("notes:\n  1 line element (E2L, E3L) passed over\n"
+                         "  cards of other tools passed over: MAT\n"),
+              std::string::npos)
+        << r.out;
+    fs::remove(text);
 }
 
 TEST(MeshCli, AFileThatCannotBeReadExitsTwoWithThePlace) {

@@ -13,6 +13,7 @@
 #include <QFile>
 #include <QImage>
 #include <QProcess>
+#include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QTableWidget>
@@ -136,6 +137,31 @@ TEST_F(HostMaps, AMeshChosenOnTheDomainPageGivesTheBoundariesAndABadOneChangesNo
 
     ZoSetOpenFileHook(previous);
     ZoSetMessageSink(sink);
+}
+
+TEST_F(HostMaps, NotesOnReadingTheMeshAreShownOnTheDomainPageAndInTheMessages) {
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN"));
+    auto* notes = m_window->CurrentDialog()->findChild<QLabel*>("meshNotes");
+    ASSERT_NE(notes, nullptr);
+    EXPECT_TRUE(notes->isHidden()); // the example reads without a note
+    QFile lines(m_dir.filePath("lines.2dm"));
+    ASSERT_TRUE(lines.open(QIODevice::WriteOnly));
+    lines.write("MESH2D\nE3T 1 1 2 3 1\nE2L 2 1 2 1\nND 1 500000 5950000 -3\n"
+                "ND 2 501000 5950000 -4\nND 3 501000 5951000 -2\n");
+    lines.close();
+    auto* file = m_window->CurrentDialog()->findChild<QLineEdit*>();
+    ASSERT_NE(file, nullptr);
+    file->setText("lines.2dm");
+    emit file->editingFinished();
+    ASSERT_EQ(m_window->Document().GetDomain()->MeshFile(), "lines.2dm");
+    EXPECT_FALSE(notes->isHidden());
+    EXPECT_TRUE(notes->text().contains("1 line element (E2L, E3L) passed over"))
+        << notes->text().toStdString();
+
+    m_window->Validate();
+    EXPECT_TRUE(m_window->MessagesText(false).contains(
+        "DOMAIN: mesh: 1 line element (E2L, E3L) passed over"))
+        << m_window->MessagesText(false).toStdString();
 }
 
 TEST_F(HostMaps, TheProjectionListOffersTheRegistryAndRefusesUnknownStrings) {

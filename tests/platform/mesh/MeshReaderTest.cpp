@@ -1,6 +1,7 @@
 #include "mesh/MeshReader.h"
 #include "UgridTestFile.h"
 #include "mesh/MeshIndex.h"
+#include "mesh/MeshRaster.h"
 
 #include <gtest/gtest.h>
 
@@ -65,6 +66,102 @@ TEST(Mesh2dm, SparseIdsAndCrLf) {
     EXPECT_EQ(r.mesh->elements[0], (CMesh::Element{0, 1, 2, -1}));
 }
 
+// One small file per kind that other tools write: what is read and what the notes say.
+TEST(Mesh2dm, FilesOfOtherTools) {
+    struct Boundary {
+        std::string name;
+        int code;
+        std::vector<int> nodes;
+    };
+    const struct Case {
+        const char* name;
+        std::string text;
+        size_t nodes, triangles, quads;
+        std::vector<Boundary> boundaries;
+        std::vector<std::string> notes; // each note begins so
+        CMesh::Element first;
+    } cases[] = {
+        {"node strings named by a word, bare or quoted",
+         "MESH2D\nND 1 0 0 -1\nND 2 1 0 -1\nND 3 1 1 -1\nND 4 0 1 -1\nND 5 2 0 -1\n"
+         "E4Q 1 1 2 3 4 1\nNS 1 2 -5 inflow_boundary\nNS 3 4 -1 \"one two\"\nNS 5 -3 7 Sea\n"
+         "NS 2 -3\n",
+         5,
+         0,
+         1,
+         {{"inflow_boundary", 2, {0, 1, 4}},
+          {"one two", 3, {2, 3, 0}},
+          {"Sea", 7, {4, 2}},
+          {"Boundary 4", 5, {1, 2}}},
+         {},
+         {0, 1, 2, 3}},
+        {"ids from 0 with gaps, out of order, elements first",
+         "E3T 0 0 7 3\nE3T 9 3 7 12 1\nND 12 1 1 0\nND 0 0 0 0\nND 7 1 0 0\nND 3 0 1 0\n"
+         "NS 12 -0\n",
+         4,
+         2,
+         0,
+         {{"Boundary 1", 2, {0, 1}}},
+         {},
+         {1, 2, 3, -1}},
+        {"line elements beside faces",
+         "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE2L 1 1 2 1\nE3T 2 1 2 3 1\n"
+         "E3L 3 1 2 3 1\n",
+         3,
+         1,
+         0,
+         {},
+         {"2 line elements (E2L, E3L) passed over"},
+         {0, 1, 2, -1}},
+        {"quadratic elements by their corners",
+         // A 6-node triangle and a 9-node quadrilateral sharing the edge 3-4-5; node 20 is in
+         // no element and stays.
+         "MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 2 0 -1\nND 4 1 1 0\nND 5 0 2 0\nND 6 0 1 0\n"
+         "ND 7 4 0 0\nND 8 4 2 0\nND 9 3 0 0\nND 10 4 1 0\nND 11 2 2 0\nND 12 3 1 0\n"
+         "ND 20 9 9 -3\nE6T 1 1 2 3 4 5 6 1\nE9Q 2 3 9 7 10 8 11 5 4 12 1\nNS 1 2 3 9 -7\n",
+         6,
+         1,
+         1,
+         {{"Boundary 1", 2, {0, 1, 3}}},
+         {"2 quadratic elements (E6T, E8Q, E9Q) read by their corner nodes; the mid-side nodes "
+          "are not used (7 nodes left out)"},
+         {0, 1, 2, -1}},
+        {"cards of other tools, CRLF and a Latin-1 name",
+         "MESH2D 4 2\r\nMESHNAME \"a\"\r\nNUM_MATERIALS_PER_ELEM 2\r\nBEGPARAMDEF\r\nGM \"x\"\r\n"
+         "ND 9 9 9 9\r\nENDPARAMDEF\r\nND 1 0 0 -2 0 0\r\nND 2 1 0 -1\r\nND 3 0 1 -3\r\n"
+         "E3T 1 1 2 3 1 4 5\r\nNS 1 -2 2 R\xe9gion\r\nBEGCURVE 1\r\n0 1\r\nENDCURVE\r\n"
+         "MAT 1 \"mud\"\r\nBEG2DMBC\r\nBC_DEF 1\r\nGP_DEF 1\r\nMAT_DEF 1\r\nEND2DMBC\r\n",
+         4,
+         1,
+         0,
+         {{"R\xe9gion", 2, {1, 2}}},
+         {"line 12: the boundary name is not valid UTF-8; kept byte for byte",
+          "cards of other tools passed over: BEG2DMBC, BEGCURVE, BEGPARAMDEF, MAT"},
+         {1, 2, 3, -1}},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.name);
+        const MeshReadResult r = Read2dm(c.text, "other.2dm");
+        ASSERT_TRUE(r.mesh) << r.error;
+        const CMesh& m = *r.mesh;
+        EXPECT_EQ(m.NodeCount(), c.nodes);
+        EXPECT_EQ(m.TriangleCount(), c.triangles);
+        EXPECT_EQ(m.QuadrilateralCount(), c.quads);
+        EXPECT_EQ(m.elements[0], c.first);
+        ASSERT_EQ(m.boundaries.size(), c.boundaries.size());
+        for (size_t i = 0; i < c.boundaries.size(); ++i) {
+            EXPECT_EQ(m.boundaries[i].name, c.boundaries[i].name);
+            EXPECT_EQ(m.boundaries[i].code, c.boundaries[i].code);
+            EXPECT_EQ(m.boundaries[i].nodes, c.boundaries[i].nodes);
+        }
+        EXPECT_EQ(m.notes, c.notes);
+        EXPECT_TRUE(m.HasBedLevel());
+    }
+    // The quadratic mesh keeps the bed levels of the corners and of the free node only.
+    const MeshReadResult q = Read2dm(cases[3].text, "q.2dm");
+    EXPECT_EQ(q.mesh->Extent().zMin, -3.0);
+    EXPECT_EQ(q.mesh->x, (std::vector<double>{0, 2, 0, 4, 4, 9}));
+}
+
 TEST(Mesh2dm, BadFilesSayWhereAndWhy) {
     const struct {
         const char* text;
@@ -91,8 +188,13 @@ TEST(Mesh2dm, BadFilesSayWhereAndWhy) {
          "bad.2dm:6: node string names node 8, which does not exist"},
         {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE3T 1 1 2 3\nNS 1 -2 4 A\nNS 2 -3 4 B\n",
          "bad.2dm:7: boundary code 4 is used twice"},
-        {"MESH2D\nE6T 1 1 2 3 4 5 6 1\n",
-         "bad.2dm:2: element type E6T is not supported (E3T and E4Q only)"},
+        {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nE2L 1 1 2 1\n",
+         "bad.2dm: no triangles or quadrilaterals (E3T, E4Q), only 1 line element"},
+        {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE6T 1 1 8 2 9 3 10 1\n",
+         "bad.2dm:5: element names node 8, which does not exist"},
+        {"MESH2D\nND 1 0 0 0\nND 2 1 0 0\nND 3 0 1 0\nE6T 1 1 2 3\n",
+         "bad.2dm:5: element 1 needs 6 nodes"},
+        {"MESH2D\nND -1 0 0 0\n", "bad.2dm:2: node id -1 is not a whole number from 0"},
     };
     for (const auto& c : cases) {
         const MeshReadResult r = Read2dm(c.text, "bad.2dm");
@@ -150,6 +252,180 @@ TEST(MeshUgrid, ReadsFacesBedLevelsBoundariesAndProjection) {
     std::remove(path.c_str());
 }
 
+const char* const kUtm32Wkt =
+    "PROJCS[\"WGS 84 / UTM zone 32N\",GEOGCS[\"WGS 84\",DATUM[\"WGS_1984\",SPHEROID[\"WGS 84\","
+    "6378137,298.257223563]],PRIMEM[\"Greenwich\",0],UNIT[\"degree\",0.0174532925199433]],"
+    "PROJECTION[\"Transverse_Mercator\"],PARAMETER[\"latitude_of_origin\",0],"
+    "PARAMETER[\"central_meridian\",9],PARAMETER[\"scale_factor\",0.9996],"
+    "PARAMETER[\"false_easting\",500000],PARAMETER[\"false_northing\",0],UNIT[\"metre\",1],"
+    "AXIS[\"Easting\",EAST],AXIS[\"Northing\",NORTH]]";
+
+// One small file per kind that other tools write, each a change of the square: the same
+// mesh must come out, with the bed level, projection and notes that the file states.
+TEST(MeshUgrid, FilesOfOtherTools) {
+    using testsupport::UgridSpec;
+    const std::string yFirst =
+        "node_coordinates lists y first: x is Mesh2_node_x, y is Mesh2_node_y";
+    const std::string oneMissing = "bed level missing on 1 of 6 nodes (fill values in Mesh2_depth)";
+    struct Case {
+        const char* name;
+        void (*change)(UgridSpec&);
+        double zMin = -5, zMax = 1.5;
+        size_t missing = 0;
+        std::string projection = "UTM-32";
+        std::vector<std::string> notes = {};
+    };
+    const Case cases[] = {
+        {"classic", [](UgridSpec&) {}},
+        {"64-bit offset", [](UgridSpec& s) { s.format = NC_64BIT_OFFSET; }},
+        {"netCDF-4, int64 table",
+         [](UgridSpec& s) { s.format = NC_NETCDF4, s.faceType = NC_INT64; }},
+        {"netCDF-4, uint32 table",
+         [](UgridSpec& s) { s.format = NC_NETCDF4, s.faceType = NC_UINT; }},
+        {"double table with NaN as fill", [](UgridSpec& s) { s.faceType = NC_DOUBLE; }},
+        {"start_index as a float", [](UgridSpec& s) { s.startIndexAsFloat = true; }},
+        {"no declared fill, -1 for none", [](UgridSpec& s) { s.faceFillAttribute = false; }},
+        {"faces the second dimension, said by face_dimension",
+         [](UgridSpec& s) { s.transposed = s.faceDimensionAttribute = true; }},
+        {"older layout, nodes first", [](UgridSpec& s) { s.transposed = true; }},
+        {"latitude listed first",
+         [](UgridSpec& s) {
+             s.yFirst = true, s.epsg = 0;
+             s.xStandardName = "longitude", s.yStandardName = "latitude";
+         },
+         -5,
+         1.5,
+         0,
+         "LONG/LAT",
+         {yFirst}},
+        {"units tell x from y",
+         [](UgridSpec& s) {
+             s.yFirst = true, s.epsg = 0;
+             s.xUnits = "degrees_east", s.yUnits = "degree_N";
+         },
+         -5,
+         1.5,
+         0,
+         "LONG/LAT",
+         {yFirst}},
+        {"projected, y first",
+         [](UgridSpec& s) {
+             s.yFirst = true;
+             s.xStandardName = "projection_x_coordinate",
+             s.yStandardName = "projection_y_coordinate";
+         },
+         -5,
+         1.5,
+         0,
+         "UTM-32",
+         {yFirst}},
+        {"bed level _FillValue",
+         [](UgridSpec& s) { s.depth[3] = -999, s.depthFill = true; },
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
+        {"bed level missing_value",
+         [](UgridSpec& s) { s.depth[3] = -999, s.depthMissing = true; },
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
+        {"bed level the float default fill",
+         [](UgridSpec& s) { s.depth[3] = NC_FILL_FLOAT, s.depthType = NC_FLOAT; },
+         -5,
+         -1,
+         1,
+         "UTM-32",
+         {oneMissing}},
+        {"bed level by name, a level",
+         [](UgridSpec& s) {
+             s.depthName = "mesh2d_node_z", s.depthStandardName = "", s.depthOfMesh = false;
+         },
+         -1.5, 5},
+        {"bed level by name, a depth",
+         [](UgridSpec& s) { s.depthName = "bathymetry", s.depthStandardName = ""; }},
+        {"a depth said positive up",
+         [](UgridSpec& s) {
+             s.depthStandardName = "sea_floor_depth_below_sea_surface", s.positive = "up";
+         },
+         -1.5, 5},
+        {"no bed level",
+         [](UgridSpec& s) { s.depth.clear(); },
+         0,
+         0,
+         6,
+         "UTM-32",
+         {"bed level: none found (no node variable of the mesh is a bed level or a depth)"}},
+        {"grid_mapping on a data variable, EPSG_code",
+         [](UgridSpec& s) {
+             s.epsg = 28992, s.crsAttribute = "EPSG_code", s.gridMappingOn = "depth";
+         },
+         -5, 1.5, 0, "EPSG:28992"},
+        {"integer epsg", [](UgridSpec& s) { s.crsAttribute = "epsg"; }},
+        {"crs_wkt without a code",
+         [](UgridSpec& s) { s.crsAttribute = "crs_wkt", s.crsText = kUtm32Wkt; }},
+        {"an unknown EPSG code",
+         [](UgridSpec& s) { s.epsg = 999999; },
+         -5,
+         1.5,
+         0,
+         "",
+         {"projection crs:epsg_code = \"999999\" is not a known EPSG code; none taken"}},
+        {"a 1D topology beside the 2D one",
+         [](UgridSpec& s) { s.network1d = true; },
+         -5,
+         1.5,
+         0,
+         "UTM-32",
+         {"2D topology Mesh2 taken; passed over: network (1D)"}},
+    };
+    const std::string path = Temp("other.nc");
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.name);
+        UgridSpec s = Square();
+        c.change(s);
+        ASSERT_TRUE(testsupport::WriteUgrid(path, s));
+        const MeshReadResult r = ReadMeshFile(path);
+        ASSERT_TRUE(r.mesh) << r.error;
+        const CMesh& m = *r.mesh;
+        EXPECT_EQ(m.topology, "Mesh2");
+        EXPECT_EQ(m.NodeCount(), 6u);
+        EXPECT_EQ(m.TriangleCount(), 2u);
+        EXPECT_EQ(m.elements[2], (CMesh::Element{1, 4, 5, 2}));
+        EXPECT_EQ(m.Extent().xMax, 20.0);
+        EXPECT_EQ(m.Extent().yMax, 10.0);
+        EXPECT_EQ(m.Extent().zMin, c.zMin);
+        EXPECT_EQ(m.Extent().zMax, c.zMax);
+        EXPECT_EQ(m.MissingBedLevelCount(), c.missing);
+        EXPECT_EQ(m.HasBedLevel(), c.missing < 6);
+        if (c.missing == 1) {
+            EXPECT_TRUE(m.BedLevelMissing(3));
+            EXPECT_FALSE(m.BedLevelMissing(2));
+        }
+        EXPECT_EQ(m.projection, c.projection);
+        EXPECT_EQ(m.notes, c.notes);
+        EXPECT_EQ(m.boundaries.size(), 2u);
+    }
+    std::remove(path.c_str());
+}
+
+TEST(MeshUgrid, MissingBedLevelsAreNoDataOnTheMap) {
+    testsupport::UgridSpec s = Square();
+    s.depth[3] = -999, s.depthFill = true; // the left triangle's top corner
+    const std::string path = Temp("nodata.nc");
+    ASSERT_TRUE(testsupport::WriteUgrid(path, s));
+    const MeshReadResult r = ReadMeshFile(path);
+    ASSERT_TRUE(r.mesh) << r.error;
+    const std::vector<uint32_t> colours = ElementColours(*r.mesh);
+    EXPECT_NE(colours[0], kNoBedLevelColour);
+    EXPECT_EQ(colours[1], kNoBedLevelColour);
+    EXPECT_NE(colours[2], kNoBedLevelColour);
+    std::remove(path.c_str());
+}
+
 TEST(MeshUgrid, BadFilesGiveTheReason) {
     struct Case {
         const char* name;
@@ -159,10 +435,24 @@ TEST(MeshUgrid, BadFilesGiveTheReason) {
     const Case cases[] = {
         {"no topology", [](testsupport::UgridSpec& s) { s.topology = false; },
          "no variable with cf_role = \"mesh_topology\""},
+        {"only a 1D topology",
+         [](testsupport::UgridSpec& s) { s.topology = false, s.network1d = true; },
+         "no 2D mesh topology (only network (1D))"},
+        {"a 2D topology without faces", [](testsupport::UgridSpec& s) { s.hasFaces = false; },
+         "Mesh2: a 2D topology without faces (no face_node_connectivity)"},
+        {"six-node faces",
+         [](testsupport::UgridSpec& s) {
+             s.maxNodes = 6;
+             s.faces = {1, 2, 5, 6, 3, 4, 1, 2, 3, -1, -1, -1};
+         },
+         "Mesh2_face_nodes: faces of up to 6 nodes: the flow model takes triangles and "
+         "quadrilaterals (face 1)"},
         {"node out of range", [](testsupport::UgridSpec& s) { s.faces[2] = 9; },
-         "Mesh2_face_nodes row 1 names node 9, which does not exist"},
+         "Mesh2_face_nodes: face 1 names node 9, which does not exist (nodes 1 to 6)"},
+        {"node below start_index", [](testsupport::UgridSpec& s) { s.faces[4] = 0; },
+         "Mesh2_face_nodes: face 2 names node 0, which does not exist (nodes 1 to 6)"},
         {"two-node face", [](testsupport::UgridSpec& s) { s.faces[1] = -1; },
-         "Mesh2_face_nodes row 1 has fewer than 3 nodes"},
+         "Mesh2_face_nodes: face 1 has fewer than 3 nodes"},
         {"branching boundary",
          [](testsupport::UgridSpec& s) {
              s.edges = {1, 2, 2, 5, 2, 3, 5, 6};
