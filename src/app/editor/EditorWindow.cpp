@@ -636,7 +636,20 @@ bool CEditorWindow::SaveFile(const QString& path) {
             return false;
     }
     std::string error;
-    if (!m_doc->SaveAs(path.toStdString(), &error)) {
+    bool changed = false;
+    bool saved = m_doc->SaveAs(path.toStdString(), &error, &changed);
+    if (!saved && changed) {
+        const QMessageBox::StandardButton answer =
+            Ask({QMessageBox::Warning, tr("Save Setup"),
+                 tr("%1 was changed by another program since it was opened or saved here.\n\n"
+                    "Overwrite it with this setup?")
+                     .arg(path),
+                 QMessageBox::Save | QMessageBox::Cancel});
+        if (answer != QMessageBox::Save)
+            return false;
+        saved = m_doc->SaveAs(path.toStdString(), &error, nullptr, true);
+    }
+    if (!saved) {
         Ask({QMessageBox::Critical, tr("Save Setup"),
              tr("The setup could not be saved to %1:\n\n%2\n\nThe file was not changed.")
                  .arg(path, Q(error)),

@@ -86,6 +86,7 @@ CSetupDocument::OpenResult CSetupDocument::FromParsed(paramfile::ParseResult par
     }
     auto doc = std::make_unique<CSetupDocument>();
     doc->m_fileName = fileName;
+    doc->m_identity = parsed.identity;
     void* top = const_cast<paramfile::Section*>(&parsed.document->Root());
     POSITION pos = 0;
     for (CZoSEKivBase* c = doc->GetFirstChild(pos); c; c = doc->GetNextChild(pos))
@@ -187,12 +188,22 @@ std::string CSetupDocument::ToText(const std::string& fromFolder, const std::str
     return paramfile::WriteText(out);
 }
 
-bool CSetupDocument::SaveAs(const std::string& path, std::string* error) {
+bool CSetupDocument::SaveAs(const std::string& path, std::string* error, bool* changed,
+                            bool overwrite) {
     const std::string from = NamesFolder(), to = FolderOf(path);
     const bool moved = !from.empty() && !to.empty() && from != to;
     const std::string text = moved ? ToText(from, to) : ToText();
-    if (!paramfile::WriteFileAtomic(path, text, error))
+    auto normal = [](const std::string& p) {
+        std::error_code ec;
+        const std::filesystem::path a = std::filesystem::absolute(p, ec);
+        return (ec ? std::filesystem::path(p) : a).lexically_normal();
+    };
+    const bool sameFile = !m_fileName.empty() && normal(path) == normal(m_fileName);
+    const fileio::FileIdentity* expected = sameFile && !overwrite ? &m_identity : nullptr;
+    fileio::FileIdentity written;
+    if (!fileio::WriteFileAtomic(path, text, error, expected, changed, &written))
         return false;
+    m_identity = written;
     m_fileName = path;
     m_dropped.clear();
     if (moved) {

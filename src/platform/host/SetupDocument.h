@@ -45,8 +45,11 @@ public:
     bool Restore(const std::string& text);
     // Atomic: on failure the file on disk and this document stay as they were. Saved into
     // another folder, every relative file name is rewritten to name the same file from there
-    // (in the file and in the nodes, RebasedFileName).
-    bool SaveAs(const std::string& path, std::string* error);
+    // (in the file and in the nodes, RebasedFileName). Saving to the file that was read
+    // writes nothing when another program saved it since (changed is then set), unless
+    // overwrite is true.
+    bool SaveAs(const std::string& path, std::string* error, bool* changed = nullptr,
+                bool overwrite = false);
 
     // What the file held that no node reads, so that saving drops it (one warning each, also
     // among the warnings of Open). Empty after the first successful save.
@@ -92,6 +95,8 @@ private:
     void CheckWhatWasRead(std::vector<paramfile::Diagnostic>& warnings);
 
     std::string m_fileName;
+    // The file as read or last saved; unknown for a new setup.
+    fileio::FileIdentity m_identity;
     // What was read, for the top-level sections that are kept as they were.
     std::unique_ptr<paramfile::Document> m_source;
     std::vector<paramfile::Diagnostic> m_dropped;

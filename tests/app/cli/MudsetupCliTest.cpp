@@ -304,10 +304,10 @@ TEST_F(Cli, InputThatIsNoSetupFileIsRefused) {
         std::string input;
         const char* why;
     } cases[] = {
-        {"/dev/zero", "not a regular file"},
-        {P("fifo"), "not a regular file"},
-        {P("folder"), "Is a directory"},
-        {P("huge.setup"), "larger than 2147483646 bytes"},
+        {"/dev/zero", "is not a regular file (a character device)"},
+        {P("fifo"), "is not a regular file (a FIFO)"},
+        {P("folder"), "is a folder"},
+        {P("huge.setup"), "is 3.0 GB; setup files are read up to 2.0 GB"},
         {P("nowhere.setup"), "No such file or directory"},
     };
     for (const auto& c : cases) {
@@ -377,7 +377,7 @@ TEST_F(Cli, OutputGoesOnlyWhereASetupBelongs) {
         SCOPED_TRACE(output);
         r = Mudsetup("format " + P("real.setup") + " -o " + output, "timeout 20 ");
         EXPECT_EQ(r.exitCode, 2);
-        EXPECT_NE(r.err.find("cannot write '" + output + "': not a regular file"),
+        EXPECT_NE(r.err.find("cannot write '" + output + "': is not a regular file"),
                   std::string::npos)
             << r.err;
     }

@@ -594,5 +594,8 @@ TEST_F(EditorTest, ScreenshotsNeedNoDisplay) {
     EXPECT_EQ(run({"--screenshot", m_dir.filePath("y.png"), bad}, &err), 2);
     EXPECT_TRUE(err.contains(bad + ":")) << err.toStdString();
     EXPECT_FALSE(QFile::exists(m_dir.filePath("x.png")));
+    // The picture is written as every file is: never over a folder or a device.
+    EXPECT_EQ(run({"--screenshot", "/dev/null", kExample}, &err), 2);
+    EXPECT_TRUE(err.contains("cannot write '/dev/null': is not a regular file")) << err.toStdString();
 }
 #endif
