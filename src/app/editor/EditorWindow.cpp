@@ -37,6 +37,7 @@
 #include <QLineEdit>
 #include <QMenuBar>
 #include <QPushButton>
+#include <QRegularExpression>
 #include <QScrollArea>
 #include <QSettings>
 #include <QSignalBlocker>
@@ -72,12 +73,22 @@ void SetNode(QTreeWidgetItem* item, CZoSEKivBase* node) {
     item->setData(0, kNodeRole, QVariant::fromValue(reinterpret_cast<quintptr>(node)));
 }
 
-// A title for the tree; nameless nodes fall back to their section name.
+// A title as the modeller knows the place: the module's "MT " prefix of data-file nodes
+// goes, and a nameless item of a list is called by its kind and number, as its grid calls
+// it ("BED_DISTRIBUTION_LAYER_1" is "Layer 1").
 QString DisplayTitle(const CZoSEKivBase* node) {
     QString title = Q(node->GetTitle());
-    if (title.isEmpty())
-        title = Q(node->GetSectionName());
-    return title.isEmpty() ? QObject::tr("(unnamed)") : title;
+    if (title.startsWith(QStringLiteral("MT ")))
+        title.remove(0, 3);
+    if (!title.isEmpty())
+        return title;
+    const QString section = Q(node->GetSectionName());
+    static const QRegularExpression numbered(QStringLiteral("(?:^|_)([A-Za-z]+)_([0-9]+)$"));
+    if (const QRegularExpressionMatch m = numbered.match(section); m.hasMatch()) {
+        const QString kind = m.captured(1).toLower();
+        return kind.left(1).toUpper() + kind.mid(1) + ' ' + m.captured(2);
+    }
+    return section.isEmpty() ? QObject::tr("(unnamed)") : section;
 }
 
 // Asks for the numbers of fractions and layers of a new setup.
@@ -259,6 +270,8 @@ void CEditorWindow::BuildLayout() {
     m_messages->setHeaderLabels({tr("Section"), tr("Message")});
     m_messages->setRootIsDecorated(false);
     m_messages->setUniformRowHeights(true);
+    // A long place keeps its end in view: the item that the message is about.
+    m_messages->setTextElideMode(Qt::ElideMiddle);
     m_messages->header()->setSectionResizeMode(0, QHeaderView::Interactive);
     m_messages->header()->resizeSection(0, 380);
     m_messages->header()->setStretchLastSection(true);
@@ -745,6 +758,12 @@ void CEditorWindow::FillMessages(bool valid) {
         item->setText(0, tr("The setup is valid."));
         item->setIcon(0, style()->standardIcon(QStyle::SP_DialogApplyButton));
         item->setFirstColumnSpanned(true);
+    } else {
+        // The places shown whole, as far as half the list's width allows.
+        m_messages->resizeColumnToContents(0);
+        const int widest = m_messages->header()->sectionSize(0);
+        m_messages->header()->resizeSection(
+            0, std::clamp(widest, 380, std::max(380, m_messages->viewport()->width() / 2)));
     }
 }
 
@@ -969,9 +988,25 @@ void CEditorWindow::OnCurrentItemChanged(QTreeWidgetItem* item, QTreeWidgetItem*
     // stays on that form, where the user can mend it.
     if (QWidget* refused = ZoJustRefused(); refused && previous && m_scroll->widget() &&
                                             m_scroll->widget()->isAncestorOf(refused)) {
-        const QSignalBlocker block(m_tree);
-        m_tree->setCurrentItem(previous);
+        {
+            const QSignalBlocker block(m_tree);
+            m_tree->setCurrentItem(previous);
+        }
         refused->setFocus();
+        // The click goes on to select the item it hit once this returns: the tree is put
+        // back on the form's node after it.
+        QMetaObject::invokeMethod(
+            this,
+            [this] {
+                QTreeWidgetItem* shown = ItemOf(m_currentNode);
+                if (!shown)
+                    return;
+                const QSignalBlocker block(m_tree);
+                m_tree->setCurrentItem(shown);
+                m_tree->clearSelection();
+                shown->setSelected(true);
+            },
+            Qt::QueuedConnection);
         return;
     }
     CZoSEKivBase* node = NodeOf(item);
@@ -1026,6 +1061,8 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     if (dialog) {
         layout->addWidget(dialog);
         m_dialog = dialog;
+        // The help pane follows the page on show as it follows the tree.
+        connect(dialog, &CZoSEDlgBase::helpTopicChanged, this, [this] { ShowHelpOfSelection(); });
         dialog->Attach(node, this);
         m_initializing = true;
         dialog->Initialize();
@@ -1079,8 +1116,8 @@ void CEditorWindow::RefreshDialog() {
 }
 
 unsigned long CEditorWindow::CurrentHelpId() const {
-    if (m_dialog && m_dialog->GetHelpID())
-        return m_dialog->GetHelpID();
+    if (m_dialog && m_dialog->CurrentHelpID())
+        return m_dialog->CurrentHelpID();
     if (const auto* help = dynamic_cast<const CFemHelpBase*>(m_currentNode))
         return help->GetHelpID();
     if (!m_currentNode && m_tree->currentItem() == m_hostItem)

@@ -65,20 +65,9 @@ void CDomainKiv::MeshFile(const CString& file) {
     NotifyListeners(kMeshChanged);
 }
 
-namespace {
-// A name may stand for a folder or a device (a setup names what it likes): only files are read.
-MeshReadResult ReadMeshIfFile(const std::string& path) {
-    std::error_code ec;
-    const auto status = std::filesystem::status(path, ec);
-    if (std::filesystem::exists(status) && !std::filesystem::is_regular_file(status))
-        return {nullptr, path + ": not a regular file"};
-    return ReadMeshFile(path);
-}
-}  // namespace
-
 bool CDomainKiv::LoadMesh(const CString& storedName, const std::string& path, std::string* error) {
     const FileStamp stamp = StampOf(path);
-    MeshReadResult r = ReadMeshIfFile(path);
+    MeshReadResult r = ReadMeshFile(path); // refuses folders, devices and FIFOs at once
     if (!r.mesh) {
         if (error)
             *error = r.error;
@@ -133,7 +122,7 @@ MeshPtr CDomainKiv::EnsureMesh(const std::string& path, std::string* error) {
     // Validation asks after every edit: a large mesh, or one that fails late, is read once.
     const FileStamp stamp = StampOf(normal);
     if (normal != m_meshPath || stamp != m_meshStamp) {
-        MeshReadResult r = ReadMeshIfFile(normal);
+        MeshReadResult r = ReadMeshFile(normal);
         m_mesh = r.mesh;
         m_meshPath = normal;
         m_meshStamp = stamp;

@@ -275,7 +275,7 @@ TEST(HostData, DomainValidation) {
     EXPECT_EQ(Messages(doc).size(), 4u) << ::testing::PrintToString(Messages(doc));
     d->VerticalKind(1);
     EXPECT_EQ(doc.ValidateAll(), 0);
-    const std::string noMesh = "DOMAIN: The mesh cannot be read: m.2dm: cannot be opened";
+    const std::string noMesh = "DOMAIN: The mesh cannot be read: m.2dm: does not exist";
     EXPECT_EQ(Messages(doc),
               (std::vector<std::string>{
                   "DOMAIN: A three-dimensional domain needs at least one vertical layer",

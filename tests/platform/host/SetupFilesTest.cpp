@@ -104,7 +104,7 @@ TEST_F(ExampleAgainstItsMesh, MessagesLandOnTheNodesThatDisagree) {
         {{}, {}},
         {{{"'estuary.2dm'", "'gone.2dm'"}}, {domain + "/gone.2dm:"}},
         // A folder (or a device) is never read as a mesh.
-        {{{"'estuary.2dm'", "'data'"}}, {domain + "/data: not a regular file"}},
+        {{{"'estuary.2dm'", "'data'"}}, {domain + "/data: is a folder"}},
         {{{"name = \"River Oste\"", "name = \"Oste\""}},
          {"DOMAIN: Open boundary 3 is named \"Oste\" in the setup and \"River Oste\" in the mesh"}},
         // 500 km off the mesh; a source that is not included is not held against it.
