@@ -30,13 +30,14 @@ void ReadEverything(const Section& root) {
         const Section* s = todo.back();
         todo.pop_back();
         void* h = const_cast<Section*>(s);
-        std::unordered_map<std::string, int> seen;
+        std::unordered_map<std::string, int> seen, seenSections;
         for (int i = 0; i < s->EntryCount(); ++i) {
             if (s->EntryIsSection(i)) {
-                todo.push_back(&s->SectionAt(i));
-                Check(kivSectionByNameNum(h, std::string(s->SectionAt(i).Name()).c_str(), 1) !=
-                          nullptr,
-                      "section not found by name", std::string(s->SectionAt(i).Name()));
+                const Section& sub = s->SectionAt(i);
+                const std::string name(sub.Name());
+                todo.push_back(&sub);
+                Check(kivSectionByNameNum(h, name.c_str(), ++seenSections[name]) == &sub,
+                      "section not found by occurrence", name);
                 continue;
             }
             const Keyword& k = s->KeywordAt(i);
@@ -46,6 +47,12 @@ void ReadEverything(const Section& root) {
             Check(s->FindKeyword(name, occurrence) == &k, "keyword not found by name", name);
             void* kw = kivKeywordByNameNum(h, name.c_str(), occurrence);
             Check(kw == &k, "keyword not found by occurrence", name);
+            // A value stands on its keyword's line, after it, and after the value before.
+            for (int p = 0, column = k.Pos().column; p < k.ParamCount(); ++p) {
+                const Position at = k.ParamPos(p);
+                Check(at.line == k.Pos().line && at.column > column, "value out of place", name);
+                column = at.column;
+            }
             for (int p = 0; p <= kivParamCount(kw) + 1; ++p) {
                 int iv = 0;
                 double dv = 0;
@@ -257,5 +264,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Check(WriteText(copy) == first, "a copied document writes differently", first);
 
     ReadEverything(r.document->Root());
+    // Every section, keyword and value has been read: nothing is left to report.
+    Check(UnreadEntries(r.document->Root(), "").empty(), "read content reported as unread",
+          first);
     return 0;
 }

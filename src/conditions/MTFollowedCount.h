@@ -11,8 +11,12 @@ inline void CheckFollowedCount(void* h, int expected, const char* one, const cha
     void* keyword = kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1);
     if (!keyword)
         return;
-    int stored = kivParamCount(keyword) == 0 ? 0 : expected;
-    kivGetParam(h, "ZoSEKivListItemCount", &stored, 1, 1);
+    // No value counts as 0.
+    int stored = 0;
+    if (kivParamCount(keyword) > 0) {
+        stored = expected;
+        kivGetParam(h, "ZoSEKivListItemCount", &stored, 1, 1);
+    }
     if (stored != expected)
         kivWarn(h, "ZoSEKivListItemCount",
                 FormatString("ZoSEKivListItemCount = %d, but the setup has %d %s; the list "

@@ -129,8 +129,13 @@ bool CMTDredgingFile::ReadTrack(std::vector<double>& x, std::vector<double>& y,
 }
 
 int CMTDredgingFile::ValidateData() {
-    if (!IsFileValid() || !IsDredgingFileName(FileName())) {
-        AddError(kMsgFileNotValid);
+    CString why;
+    if (!IsFileValid(&why)) {
+        AddError(kMsgFileNotValid, why);
+        return 0;
+    }
+    if (!IsDredgingFileName(FileName())) {
+        AddError(kMsgFileNotValid, "the file name does not end in qrd0 or kx0");
         return 0;
     }
     return 1;

@@ -152,18 +152,15 @@ void CMTDredgingItemsKiv::ReadWeights(void* h) {
     for (int i = 1; i <= fractions; ++i) {
         const auto* p = static_cast<const paramfile::Param*>(kivParamByNum(k, i));
         if (!p || !p->AsDouble(read[static_cast<std::size_t>(i - 1)])) {
+            kivParamByNum(k, count);  // the list is refused whole, in this one warning
             kivWarn(h, kWeights,
                     FormatString("'%s' value %d is not a number; the weights are kept",
                                  kWeights, i));
             return;
         }
     }
+    // Weights past the fractions are reported with what else reading passed over.
     m_weights = std::move(read);
-    if (count > fractions)
-        kivWarn(h, kWeights,
-                FormatString("'%s' holds %d values for %d fraction%s; the last %d %s dropped",
-                             kWeights, count, fractions, fractions == 1 ? "" : "s",
-                             count - fractions, count - fractions == 1 ? "is" : "are"));
 }
 
 void CMTDredgingItemsKiv::ReadDataFile(void* h) {
@@ -178,7 +175,8 @@ void CMTDredgingItemsKiv::ReadDataFile(void* h) {
         kivGetListParam(h, kItemNumbers, 1, "iiii", &n[0], &n[1], &n[2], &n[3]);
         for (int i = 0; i < CMTDredgingFile::kItemCount; ++i)
             m_file->ItemNumber(i + 1, n[i]);
-        if (kivParamCount(k) != CMTDredgingFile::kItemCount)
+        // More are reported with what else reading passed over.
+        if (kivParamCount(k) < CMTDredgingFile::kItemCount)
             kivWarn(h, kItemNumbers,
                     FormatString("'%s' holds %d values where the dredger reads 4 (x, y, rate, "
                                  "spill)",

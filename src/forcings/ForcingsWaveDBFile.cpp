@@ -21,12 +21,12 @@ void CForcingsWaveDBFile::SetUpFileSelector(CZoFileSelector& selector) {
     selector.AddRequest("Wave direction").SetMultiOvuType({100095, 100407});
 }
 
-bool CForcingsWaveDBFile::CheckFile() {
+bool CForcingsWaveDBFile::CheckFile(CString* why) {
     const CForcingsWavesKiv* waves = WavesSection(this);
     if (waves && waves->WaveType() != CForcingsWavesKiv::kWaveDatabase)
         return true;
     // With the item numbers: items that are not the wave quantities would not do either.
-    return IsFileValid();
+    return IsFileValid(why);
 }
 
 void CForcingsWaveDBFile::SetDefault() {
@@ -35,8 +35,9 @@ void CForcingsWaveDBFile::SetDefault() {
 }
 
 int CForcingsWaveDBFile::ValidateData() {
-    if (CheckFile())
+    CString why;
+    if (CheckFile(&why))
         return 1;
-    AddError(kMsgFileNotValid);
+    AddError(kMsgFileNotValid, why);
     return 0;
 }

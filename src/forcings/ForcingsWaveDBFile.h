@@ -10,8 +10,9 @@ public:
 
     static constexpr int kItems = 3;
     void SetUpFileSelector(CZoFileSelector& selector) override;
-    // Passes unless the waves come from the database and the file will not do.
-    bool CheckFile();
+    // Passes unless the waves come from the database and the file will not do (why says
+    // what is wrong).
+    bool CheckFile(CString* why = nullptr);
 
     void WriteData(void*) override {}
     void DescribeKeywords(KeywordSink&) override {}

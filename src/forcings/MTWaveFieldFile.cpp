@@ -60,18 +60,26 @@ void CMTWaveFieldFile::SetUpFileSelector(CZoFileSelector& selector) {
     selector.AddRequest("Wave direction").SetMultiOvuType({100095, 100407});
 }
 
-bool CMTWaveFieldFile::CheckFile() {
+bool CMTWaveFieldFile::CheckFile(CString* why) {
     const CForcingsWavesKiv* waves = WavesSection(this);
     if (!waves || waves->WaveType() != CForcingsWavesKiv::kWaveField)
         return true;
     const CString& name = FileName();
+    auto misnamed = [&](const char* endings) {
+        if (why)
+            *why = FormatString("the file name does not end in %s", endings);
+        return false;
+    };
     switch (WaveField()->GetFormat()) {
     case CMTWaveFieldKiv::kTimeSeries:
-        return (EndsWithNoCase(name, "qrd0") || EndsWithNoCase(name, "kx0")) && IsFileValid();
+        if (!EndsWithNoCase(name, "qrd0") && !EndsWithNoCase(name, "kx0"))
+            return misnamed("qrd0 or kx0");
+        return IsFileValid(why);
     case CMTWaveFieldKiv::kTimeAndDomain:
-        return (EndsWithNoCase(name, "qrdu") || EndsWithNoCase(name, "qrd2") ||
-                EndsWithNoCase(name, "kx2")) &&
-               IsFileValid();
+        if (!EndsWithNoCase(name, "qrdu") && !EndsWithNoCase(name, "qrd2") &&
+            !EndsWithNoCase(name, "kx2"))
+            return misnamed("qrdu, qrd2 or kx2");
+        return IsFileValid(why);
     default:
         return true;
     }
@@ -84,8 +92,9 @@ void CMTWaveFieldFile::SetDefault() {
 }
 
 int CMTWaveFieldFile::ValidateData() {
-    if (CheckFile())
+    CString why;
+    if (CheckFile(&why))
         return 1;
-    AddError(kMsgFileNotValid);
+    AddError(kMsgFileNotValid, why);
     return 0;
 }

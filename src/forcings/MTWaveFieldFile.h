@@ -19,8 +19,9 @@ public:
 
     // The period's time check, and for a data-file format the three item requests.
     void SetUpFileSelector(CZoFileSelector& selector) override;
-    // Passes unless the waves take the wave field from a file that will not do.
-    bool CheckFile();
+    // Passes unless the waves take the wave field from a file that will not do; why says
+    // what is wrong.
+    bool CheckFile(CString* why = nullptr);
 
     void WriteData(void*) override {}
     void DescribeKeywords(KeywordSink&) override {}

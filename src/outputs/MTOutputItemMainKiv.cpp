@@ -276,9 +276,9 @@ void CMTOutputItemMainKiv::ReadArea(void* area) {
 }
 
 bool CMTOutputItemMainKiv::CheckData(bool report) {
-    auto fail = [&](unsigned id) {
+    auto fail = [&](unsigned id, const CString& why = {}) {
         if (report)
-            AddError(id);
+            AddError(id, why);
         return false;
     };
     if (m_include == 0)
@@ -298,10 +298,12 @@ bool CMTOutputItemMainKiv::CheckData(bool report) {
     if (!folder.empty()) {
         std::error_code ec;
         if (!std::filesystem::is_directory(AbsolutePath(folder.string()), ec))
-            return fail(4112);
+            return fail(4112, FormatString("the folder '%s' does not exist",
+                                           folder.string().c_str()));
     }
     if (!EndsWithNoCase(name, ExtensionOfFormat(m_format)))
-        return fail(4112);
+        return fail(4112, FormatString("the file name does not end in %s (format %d)",
+                                       ExtensionOfFormat(m_format), m_format));
 
     const CDomainKiv* domain = Domain(this);
     const int layers = domain ? domain->LayerTotNum() : 0;

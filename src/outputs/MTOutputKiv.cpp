@@ -29,19 +29,7 @@ bool CMTOutputKiv::NameNewOutputs() {
 
 void CMTOutputKiv::WriteData(void* h) { kivPutParam(h, "number_of_outputs", GetItemCount()); }
 
-void CMTOutputKiv::ReadData(void* h) {
-    if (!kivKeywordByNameNum(h, "number_of_outputs", 1))
-        return;
-    int n = GetItemCount();
-    kivGetParam(h, "number_of_outputs", &n, 1, 1);
-    if (n < 0 || n > kMaxListItemCount) {
-        kivWarn(h, "number_of_outputs",
-                FormatString("number_of_outputs = %d is not between 0 and %d; kept %d", n,
-                             kMaxListItemCount, GetItemCount()));
-        return;
-    }
-    SetItemCount(n, 1);
-}
+void CMTOutputKiv::ReadData(void* h) { ReadEngineCount(h, "number_of_outputs", "output"); }
 
 const char* CMTOutputKiv::GetDlgRuntimeClass(unsigned code) {
     return code == kDlgRuntimeClassRequest ? "CMTOutputDlg"

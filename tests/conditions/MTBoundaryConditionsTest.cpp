@@ -1,4 +1,10 @@
 #include "ConditionsTestSupport.h"
+#include "fem/SimulationPeriodKiv.h"
+
+#include <filesystem>
+#include <fstream>
+
+namespace fs = std::filesystem;
 
 #include <fstream>
 #include <sstream>
@@ -212,7 +218,8 @@ TEST(BoundaryConditions, ValidationOfValuesNamesTheBoundaryAsItIsNow) {
          "Constant value must be larger than or equal to 0.0"},
         {"time series without a file", 1, 1, 0.0, "", 0.0, {1}, 2,
          "No data file is given for the boundary values"},
-        {"time series with a file", 1, 1, 0.0, "ssc.qrd0", 0.0, {1}, 2, nullptr},
+        {"time series with a file that is not there", 1, 1, 0.0, "ssc.qrd0", 0.0, {1}, 2,
+         "File is not valid"},
         {"no item chosen", 1, 3, 0.0, "ssc.qrd0", 0.0, {}, 2,
          "No item of the data file is chosen for the boundary values"},
         {"item number below 1", 1, 2, 0.0, "ssc.qrd0", 0.0, {2, 0}, 2,
@@ -299,4 +306,71 @@ TEST(BoundaryConditions, ValuesDroppedWithAFractionComeBackAsNew) {
     EXPECT_EQ(again->Value()->Type(), 0);
     EXPECT_FALSE(again->GetHasBeenTouched());
     EXPECT_EQ(edited->ToText(), fresh->ToText());
+}
+
+// A value read from a data file passes only with a file that will do, and the message says
+// what is wrong with it.
+TEST(BoundaryConditions, AValuesDataFileIsCheckedAndTheReasonGiven) {
+    const fs::path dir = fs::temp_directory_path() / "mudsetup-boundary-files";
+    fs::remove_all(dir);
+    fs::create_directories(dir / "folder.qrd0");
+    auto write = [&](const char* name, const std::string& text) {
+        std::ofstream(dir / name, std::ios::binary) << text;
+    };
+    // Hourly over a day from 2024-01-01.
+    auto header = [](const char* kind, long unitType, const char* layout, int steps = 25) {
+        return std::string(kind) + " 1\nstart 2024-01-01 00:00:00\nstep 3600\nsteps " +
+               std::to_string(steps) + "\n" + layout + "items 1\nitem \"ssc\" " +
+               std::to_string(unitType) + "\nvalues\n";
+    };
+    write("ssc.qrd0", header("qrd0", 100403, ""));
+    write("short.qrd0", header("qrd0", 100403, "", 3));
+    write("height.qrd0", header("qrd0", 100084, ""));
+    write("line.qrd1", header("qrd1", 100403, "points 4\n"));
+    write("stations.xyz", "1 2 3 a\n");
+    struct Case {
+        int format;
+        const char* file;
+        const char* reason;  // part of the detail; null: valid
+    };
+    const Case cases[] = {
+        {1, "ssc.qrd0", nullptr},
+        {1, "none.qrd0", "none.qrd0: the file does not exist"},
+        {1, "folder.qrd0", "is a folder"},
+        {1, "stations.xyz", "stations.xyz"},
+        {1, "line.qrd1", "a line series file, where a time series file is needed"},
+        {1, "height.qrd0", "is a Wave height"},
+        {1, "short.qrd0", "does not cover the simulation period"},
+        {2, "line.qrd1", nullptr},
+        {3, "line.qrd1", nullptr},
+        {2, "ssc.qrd0", "a time series file, where a line series file is needed"},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(::testing::Message() << c.format << " " << c.file);
+        auto doc = NewSetup(1, 1, 1);
+        doc->GetPeriod()->StartTime("2024-01-01 00:00:00");
+        doc->GetPeriod()->TimeStepInterval(3600);
+        doc->GetPeriod()->TimeStepCount(24);
+        CMTBoundaryConditionsComponentItemKiv* item = Conditions(*doc)->GetItem(1)->GetItem(1);
+        item->Type(1);
+        item->Format(c.format);
+        item->QrdData()->FileName((dir / c.file).string());
+        item->QrdData()->ItemNumbers({1});
+        doc->ValidateAll();
+        std::vector<const CZoSEKivGlobalBase::ErrorEntry*> errors;
+        for (const auto& e : doc->Errors())
+            if (e.node == item)
+                errors.push_back(&e);
+        CString why;
+        EXPECT_EQ(item->CheckFile(&why), c.reason == nullptr) << why;
+        if (!c.reason) {
+            EXPECT_TRUE(errors.empty()) << errors.front()->Text();
+            continue;
+        }
+        ASSERT_EQ(errors.size(), 1u);
+        EXPECT_EQ(errors[0]->message, "File is not valid");
+        EXPECT_NE(errors[0]->detail.find(c.reason), std::string::npos) << errors[0]->detail;
+        EXPECT_EQ(errors[0]->Text(), "File is not valid: " + errors[0]->detail);
+    }
+    fs::remove_all(dir);
 }

@@ -178,7 +178,7 @@ TEST(MTDredgingKiv, WeightsAreReadOnlyWholeAndWhatIsKeptIsReported) {
         {"weights_fraction = 50.0, 50.0", {third, third, third}, "holds 2 values for 3 fractions"},
         {"weights_fraction = 50.0, \"x\", 50.0", {third, third, third}, "value 2 is not a number; the weights are kept"},
         {"weights_fraction = 50.0, true, 50.0", {third, third, third}, "value 2 is not a number"},
-        {"weights_fraction = 10.0, 20.0, 70.0, 5.0", {10, 20, 70}, "holds 4 values for 3 fractions; the last 1 is dropped"},
+        {"weights_fraction = 10.0, 20.0, 70.0, 5.0", {10, 20, 70}, "'weights_fraction' in MUD_TRANSPORT_MODULE/DREDGING/DREDGER_1 holds 4 values where 3 are read: value 4 is not read, dropped on saving"},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.keyword);

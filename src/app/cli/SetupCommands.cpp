@@ -95,7 +95,7 @@ int Validate(const std::string& file) {
         return kExitError;
     const int ok = doc->ValidateAll();
     for (const CZoSEKivGlobalBase::ErrorEntry& e : doc->Errors())
-        std::cout << NodePath(e.node) << ": " << e.message << "\n";
+        std::cout << NodePath(e.node) << ": " << e.Text() << "\n";
     if (!FlushStdout())
         return kExitError;
     return ok && doc->Errors().empty() && warnings == 0 ? kExitOk : kExitInvalid;

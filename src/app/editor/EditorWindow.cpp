@@ -748,9 +748,9 @@ void CEditorWindow::FillMessages(bool valid) {
         item->setText(0, e.node ? TitlePath(e.node) : path);
         item->setToolTip(0, path);
         item->setData(0, Qt::UserRole + 1, path);
-        item->setText(1, Q(e.message));
+        item->setText(1, Q(e.Text()));
         item->setIcon(0, icon);
-        item->setToolTip(1, Q(e.message));
+        item->setToolTip(1, Q(e.Text()));
         SetNode(item, e.node);
     }
     if (valid) {

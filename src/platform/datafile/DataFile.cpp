@@ -178,6 +178,11 @@ bool HeaderParser::NextLine(std::vector<Token>& tokens, std::optional<Error>& er
             break;
         Token t;
         t.column = static_cast<int>(i) + 1;
+        // A NUL byte would cut a name short wherever it is passed on as C text.
+        auto nul = [&](std::size_t at) {
+            error = Fail(m_line, static_cast<int>(at) + 1, "a NUL byte (0x00) in a text");
+            return true;
+        };
         if (c == '"') {
             t.quoted = true;
             ++i;
@@ -188,12 +193,25 @@ bool HeaderParser::NextLine(std::vector<Token>& tokens, std::optional<Error>& er
                     closed = true;
                     break;
                 }
+                if (d == '\0')
+                    return nul(i - 1);
                 if (d == '\\' && i < line.size()) {
                     d = line[i++];
-                    if (d == 'n')
-                        d = '\n';
-                    else if (d == 't')
-                        d = '\t';
+                    switch (d) {
+                    case '"':
+                    case '\\': break;
+                    case 'n': d = '\n'; break;
+                    case 't': d = '\t'; break;
+                    default: {
+                        const auto u = static_cast<unsigned char>(d);
+                        char shown[8];
+                        std::snprintf(shown, sizeof shown, u > 32 && u < 127 ? "\\%c" : "\\x%02X", u);
+                        error = Fail(m_line, static_cast<int>(i) - 1,
+                                     std::string("unknown escape \"") + shown +
+                                         "\" in a quoted text (\\\", \\\\, \\n and \\t are known)");
+                        return true;
+                    }
+                    }
                 }
                 t.text += d;
             }
@@ -202,8 +220,11 @@ bool HeaderParser::NextLine(std::vector<Token>& tokens, std::optional<Error>& er
                 return true;
             }
         } else {
-            while (i < line.size() && line[i] != ' ' && line[i] != '\t' && line[i] != '#')
+            while (i < line.size() && line[i] != ' ' && line[i] != '\t' && line[i] != '#') {
+                if (line[i] == '\0')
+                    return nul(i);
                 t.text += line[i++];
+            }
         }
         tokens.push_back(std::move(t));
     }
@@ -1011,6 +1032,12 @@ XyzResult ParseXyz(std::string_view text, const std::string& name) {
         std::string_view rest = l.substr(i);
         while (!rest.empty() && (rest.back() == ' ' || rest.back() == '\t'))
             rest.remove_suffix(1);
+        if (const std::size_t nul = rest.find('\0'); nul != std::string_view::npos) {
+            r.error = Error{name, line, static_cast<int>(rest.data() - l.data() + nul) + 1,
+                            "a NUL byte (0x00) in the point's name"};
+            r.points.clear();
+            return r;
+        }
         p.name = std::string(rest);
         r.points.push_back(std::move(p));
     }

@@ -1,5 +1,9 @@
 #include "BoundaryConditionsComponentItemKiv.h"
 
+#include <algorithm>
+
+#include "SimulationPeriodKiv.h"
+#include "datafile/ZoFileSelector.h"
 #include "paramfile/Kiv.h"
 #include "setupeditor/KivFields.h"
 #include "setupeditor/MessageTable.h"
@@ -7,6 +11,7 @@
 namespace {
 // Concentrations cannot be negative; other quantities (water levels) can.
 constexpr long kConcentrationType = 100403;
+constexpr unsigned kMsgFileNotValid = 4112;
 
 const std::shared_ptr<const std::vector<CString>>& NoTexts() {
     static const auto texts = std::make_shared<const std::vector<CString>>();
@@ -124,12 +129,16 @@ int CBoundaryConditionsComponentItemKiv::ValidateData() {
         fail("No data file is given for the boundary values");
     } else if (m_file.ItemNumbers().empty()) {
         fail("No item of the data file is chosen for the boundary values");
-    } else {
+    } else if (std::any_of(m_file.ItemNumbers().begin(), m_file.ItemNumbers().end(),
+                           [](int n) { return n < 1; })) {
         for (int n : m_file.ItemNumbers())
             if (n < 1) {
                 fail(FormatString("Item number %d of the data file is not valid", n));
                 break;
             }
+    } else if (CString why; !CheckFile(&why)) {
+        AddError(kMsgFileNotValid, why);
+        ok = 0;
     }
     if (m_softTime < 0.0)
         fail("The soft-start interval must not be negative");
@@ -137,6 +146,23 @@ int CBoundaryConditionsComponentItemKiv::ValidateData() {
         m_typeTI > kInterpolationLast || m_typeSI < 0 || m_typeSI > kInterpolationLast)
         fail(LoadMessage(4127));
     return ok;
+}
+
+bool CBoundaryConditionsComponentItemKiv::CheckFile(CString* why) const {
+    if (m_type != kTypeSpecified || m_format < 1 || m_format > kFormatLast)
+        return true;
+    CZoFileSelector selector(this);
+    CZoItemRequest& request = selector.AddRequest(GetTitle().empty() ? CString("Value") : GetTitle());
+    if (m_ovuType != 0)
+        request.SetOvuType(m_ovuType);
+    selector.SetMinNoItems(1);
+    // Values in time come from a time series; values along the boundary from a line series.
+    selector.SetAcceptedKinds({m_format == 1 ? datafile::Kind::TimeSeries
+                                             : datafile::Kind::LineSeries});
+    if (m_format & 1)
+        if (const CSimulationPeriodKiv* period = SimulationPeriod(this))
+            period->SetUpQrdValidation_SimulationPeriod(selector);
+    return selector.IsQrdFileValid(m_file.FileName(), m_file.ItemNumbers(), why);
 }
 
 void CBoundaryConditionsComponentItemKiv::RememberDefaults() {

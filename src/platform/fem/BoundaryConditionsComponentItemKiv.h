@@ -57,6 +57,11 @@ public:
     static CString SoftStartName(int type);
     static CString InterpolationName(int type, bool inSpace);
 
+    // Whether the data file of a specified value read from a file will do (from its header:
+    // kind, item and unit type, and for values in time the simulation period); why says
+    // what is wrong. Passes for other types and formats.
+    bool CheckFile(CString* why = nullptr) const;
+
     void WriteData(void* h) override;
     void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <limits>
 #include <new>
+#include <optional>
 #include <unordered_set>
 
 #include <sys/mman.h>
@@ -183,6 +184,8 @@ std::size_t Document::Impl::MemoryBytes() const {
     n += TableBytes(params.capacity() * sizeof(Param));
     n += TableBytes(entries.capacity() * sizeof(std::uint32_t));
     n += names.Bytes() + text.Bytes();
+    n += wideColumns.size() * (sizeof(std::pair<const std::uint32_t, int>) + 2 * sizeof(void*));
+    n += foundKeywords.capacity() * sizeof(std::uint32_t) + foundSections.capacity();
     for (const Diagnostic& w : warnings)
         n += sizeof w + w.file.capacity() + w.message.capacity();
     return n;
@@ -248,6 +251,9 @@ float FloatOfText(const char* begin, const char* end, double d) {
 }
 
 // --- Param -------------------------------------------------------------------------------
+
+// Documents hold millions of parameters: the column lives in what was padding.
+static_assert(sizeof(Param) == 16);
 
 ParamType Param::Type() const {
     return type_;
@@ -377,6 +383,25 @@ bool Keyword::WasFound() const {
         return false;
     const Document::Impl& d = doc_->impl();
     return d.WasFound(static_cast<std::uint32_t>(this - d.keywords.data()), false);
+}
+Position Keyword::ParamPos(int index) const {
+    if (!doc_ || index < 0 || static_cast<std::uint32_t>(index) >= count_)
+        return pos_;
+    const Document::Impl& d = doc_->impl();
+    // Back along the steps to the keyword, or to a value whose column is kept whole.
+    int column = 0;
+    for (std::uint32_t at = first_ + static_cast<std::uint32_t>(index);; --at) {
+        const std::uint16_t step = Access::ColumnOf(d.params[at]);
+        if (step == 0)
+            return pos_; // built, not read
+        if (step == Document::Impl::kWideColumn) {
+            const auto it = d.wideColumns.find(at);
+            return it == d.wideColumns.end() ? pos_ : Position{pos_.line, it->second + column};
+        }
+        column += step;
+        if (at == first_)
+            return {pos_.line, pos_.column + column};
+    }
 }
 
 std::string_view Section::Name() const {
@@ -528,6 +553,30 @@ Position Document::End() const {
     return impl_->end;
 }
 
+namespace {
+
+// Values past the last one read of a found keyword ("count = 3, 4"). A keyword found but
+// none of whose values was read through a look-up is left alone: its reader looked only
+// at whether it is there.
+std::optional<Diagnostic> ExtraValues(const Document::Impl& d, std::uint32_t at,
+                                      const std::string& path) {
+    const Keyword& k = d.keywords[at];
+    const std::uint32_t read = d.ValuesRead(at);
+    const auto count = static_cast<std::uint32_t>(k.ParamCount());
+    if (read == 0 || read >= count)
+        return std::nullopt;
+    const std::string first = std::to_string(read + 1);
+    const std::string last = std::to_string(count);
+    return Diagnostic{d.fileName, k.ParamPos(static_cast<int>(read)),
+                      Cat("'", k.Name(), "' in ", path, " holds ", last, " values where ",
+                          std::to_string(read), read == 1 ? " is" : " are", " read: ",
+                          read + 1 == count ? Cat("value ", last, " is")
+                                            : Cat("values ", first, " to ", last, " are"),
+                          " not read, dropped on saving")};
+}
+
+} // namespace
+
 std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string& path) {
     std::vector<Diagnostic> out;
     const Document* doc = Access::DocOf(section);
@@ -554,6 +603,8 @@ std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string&
             if (d.WasFound(at, isSection)) {
                 if (isSection)
                     todo.push_back({&d.sections[at], Cat(t.path, "/", d.names[name])});
+                else if (std::optional<Diagnostic> extra = ExtraValues(d, at, t.path))
+                    out.push_back(std::move(*extra));
                 continue;
             }
             if (!namesKnown) {
@@ -756,9 +807,10 @@ void Builder::AddKeyword(std::string_view name) {
 }
 
 namespace {
-void AddParam(Document::Impl& d, std::int64_t keyword, const Param& p) {
+void AddParam(Document::Impl& d, std::int64_t keyword, Param p) {
     if (keyword < 0)
         return;
+    Access::SetColumn(p, 0); // a copied value's column was that of its own text
     d.params.push_back(p);
     ++Access::ParamCount(d.keywords[keyword]);
 }

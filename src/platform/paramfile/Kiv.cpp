@@ -2,7 +2,10 @@
 
 #include "paramfile/ParamFileImpl.h"
 
+#include <algorithm>
+#include <climits>
 #include <cstdarg>
+#include <cstring>
 
 using paramfile::Access;
 using paramfile::Builder;
@@ -29,12 +32,23 @@ struct Found {
     int index = 0;
 };
 
+// Values 1 .. n of k count as read: those past them are reported as unread content.
+void MarkRead(const Keyword* k, int n) {
+    if (!k || !Access::DocOf(*k) || n < 1)
+        return;
+    const auto& d = Access::Of(*k);
+    d.MarkValuesRead(static_cast<std::uint32_t>(k - d.keywords.data()),
+                     static_cast<std::uint32_t>(std::min(n, k->ParamCount())));
+}
+
+// The keyword is set whenever it was found, the parameter only when it has that value.
 Found Lookup(void* h, const char* keyword, int occurrence, int index) {
     if (!h || !keyword)
         return {};
     const Keyword* k = In(h)->FindKeyword(keyword, occurrence);
     if (!k || index < 1 || index > k->ParamCount())
-        return {};
+        return {k, nullptr, index};
+    MarkRead(k, index);
     return {k, &k->ParamAt(index - 1), index};
 }
 
@@ -121,12 +135,38 @@ void ReadFileName(const Found& f, std::string* value) {
         WarnType(f, "a file name");
 }
 
+std::string KeptText(const int* v) {
+    return std::to_string(*v);
+}
+std::string KeptText(const double* v) {
+    return ValueText(Access::Double(*v));
+}
+std::string KeptText(const float* v) {
+    return ValueText(Access::Float(*v));
+}
+std::string KeptText(const bool* v) {
+    return *v ? "true" : "false";
+}
+std::string KeptText(const std::string* v) {
+    return paramfile::Cat("\"", *v, "\"");
+}
+
+// "count =" where a value is read: the target keeps what it holds, which is said.
+bool HasNoValue(const Found& f) {
+    return f.keyword && f.keyword->ParamCount() == 0;
+}
+void WarnNoValue(const Found& f, const std::string& kept) {
+    Warn(f, paramfile::Cat("'", f.keyword->Name(), "' has no value; kept ", kept));
+}
+
 template <class T> void Get(void* h, const char* keyword, T* value, int occurrence, int index) {
     if (!value)
         return;
     const Found f = Lookup(h, keyword, occurrence, index);
     if (f.param)
         Read(f, value);
+    else if (HasNoValue(f))
+        WarnNoValue(f, KeptText(value));
 }
 
 } // namespace
@@ -271,6 +311,7 @@ void* kivParamByNum(void* k, int n) {
     const auto* kw = static_cast<const Keyword*>(k);
     if (!kw || n < 1 || n > kw->ParamCount())
         return nullptr;
+    MarkRead(kw, n);
     return const_cast<Param*>(&kw->ParamAt(n - 1));
 }
 
@@ -322,6 +363,8 @@ void kivGetParamFilename(void* h, const char* keyword, std::string* value, int o
     const Found f = Lookup(h, keyword, occurrence, index);
     if (f.param)
         ReadFileName(f, value);
+    else if (HasNoValue(f))
+        WarnNoValue(f, paramfile::Cat("'", *value, "'"));
 }
 
 void kivGetListParam(void* h, const char* keyword, int occurrence, const char* format, ...) {
@@ -330,6 +373,7 @@ void kivGetListParam(void* h, const char* keyword, int occurrence, const char* f
     const Keyword* k = In(h)->FindKeyword(keyword, occurrence);
     if (!k)
         return;
+    MarkRead(k, static_cast<int>(std::min<std::size_t>(std::strlen(format), INT_MAX)));
     va_list args;
     va_start(args, format);
     int index = 0;

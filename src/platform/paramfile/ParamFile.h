@@ -70,6 +70,9 @@ private:
     std::uint32_t aux_ = 0;
     ParamType type_ = ParamType::Integer;
     std::uint8_t flags_ = 0;
+    // Columns from the value before (the first from its keyword); 0 where built in memory.
+    // A step too long for 16 bits is kept aside by the document.
+    std::uint16_t column_ = 0;
 };
 
 class Keyword {
@@ -81,6 +84,9 @@ public:
     const Section& Owner() const;
     // True once a look-up by name (FindKeyword) has found this keyword.
     bool WasFound() const;
+    // Where a parameter (0-based) stands: its line and column when read from text, else
+    // the keyword's position. Counted back over the values before it.
+    Position ParamPos(int index) const;
 
 private:
     friend class Document;
@@ -161,8 +167,9 @@ struct ParseResult {
 };
 
 // Every entry below section that no look-up found, one message each at its place ("unknown
-// keyword 'x' in PATH"); the subsections found are searched in turn, the others reported
-// whole. path names section in the messages. Linear in the entries.
+// keyword 'x' in PATH"), and the values of found keywords past the last one read, at the
+// first of them; the subsections found are searched in turn, the others reported whole.
+// path names section in the messages. Linear in the entries.
 std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string& path);
 
 // Checks the whole text first: on a syntax error nothing is returned but the error.

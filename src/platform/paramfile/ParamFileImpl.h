@@ -4,6 +4,7 @@
 
 #include "paramfile/ParamFile.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
@@ -104,20 +105,39 @@ struct Document::Impl {
     Position end;                // where the text read ended
     mutable std::vector<Diagnostic> warnings;
 
-    // Which entries a look-up by name has found: what no one asked for was not read.
-    mutable std::vector<std::uint8_t> foundKeywords;
+    // Which entries a look-up by name has found: what no one asked for was not read. For a
+    // keyword, 1 + the number of its values read (the highest read), 0 when never found.
+    mutable std::vector<std::uint32_t> foundKeywords;
     mutable std::vector<std::uint8_t> foundSections;
     void MarkFound(std::uint32_t at, bool isSection) const {
-        auto& found = isSection ? foundSections : foundKeywords;
-        const std::size_t size = isSection ? sections.size() : keywords.size();
-        if (found.size() < size)
-            found.resize(size, 0);
-        found[at] = 1;
+        if (isSection) {
+            if (foundSections.size() < sections.size())
+                foundSections.resize(sections.size(), 0);
+            foundSections[at] = 1;
+        } else {
+            MarkValuesRead(at, 0);
+        }
     }
     bool WasFound(std::uint32_t at, bool isSection) const {
-        const auto& found = isSection ? foundSections : foundKeywords;
-        return at < found.size() && found[at] != 0;
+        if (isSection)
+            return at < foundSections.size() && foundSections[at] != 0;
+        return at < foundKeywords.size() && foundKeywords[at] != 0;
     }
+    // Values 1 .. count of keyword at have been read.
+    void MarkValuesRead(std::uint32_t at, std::uint32_t count) const {
+        if (foundKeywords.size() < keywords.size())
+            foundKeywords.resize(keywords.size(), 0);
+        foundKeywords[at] = std::max(foundKeywords[at], count + 1);
+    }
+    std::uint32_t ValuesRead(std::uint32_t at) const {
+        return at < foundKeywords.size() && foundKeywords[at] > 0 ? foundKeywords[at] - 1 : 0;
+    }
+
+    // Where a value follows the one before by more than 16 bits of columns (a string of
+    // 64 kB), its column itself, by parameter index. Steps keep this map as small as such
+    // values are rare, however long a line.
+    static constexpr std::uint16_t kWideColumn = 0xFFFF;
+    std::unordered_map<std::uint32_t, int> wideColumns;
 
     // Comments, kept with the entry that follows them (and the one on whose line they stand);
     // keyed by entry code (keyword index, or section index with kSectionBit). Those after a
@@ -155,6 +175,7 @@ struct Access {
     // Null for the placeholder handed out for an index out of range.
     static const Document* DocOf(const Section& s) { return s.doc_; }
     static const Document::Impl& Of(const Keyword& k) { return k.doc_->impl(); }
+    static const Document* DocOf(const Keyword& k) { return k.doc_; }
 
     static Param Int(std::int64_t v) {
         Param p;
@@ -233,6 +254,8 @@ struct Access {
     static std::uint32_t NameId(const Keyword& k) { return k.name_; }
     static std::uint32_t NameId(const Section& s) { return s.name_; }
     static std::uint32_t FirstEntry(const Section& s) { return s.firstEntry_; }
+    static void SetColumn(Param& p, std::uint16_t column) { p.column_ = column; }
+    static std::uint16_t ColumnOf(const Param& p) { return p.column_; }
     static std::uint32_t EntryCount(const Section& s) { return s.entryCount_; }
 };
 

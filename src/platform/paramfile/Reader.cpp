@@ -166,7 +166,16 @@ private:
     bool ReadFileName();
     bool ReadNumber();
     bool ReadWord();
-    void Push(const Param& p) {
+    void Push(Param p) {
+        const auto column = static_cast<std::size_t>(valueStart_ - lineStart_) + 1;
+        const std::size_t step = column - lastColumn_;
+        if (step < Document::Impl::kWideColumn) {
+            Access::SetColumn(p, static_cast<std::uint16_t>(step));
+        } else {
+            Access::SetColumn(p, Document::Impl::kWideColumn);
+            d_.wideColumns[static_cast<std::uint32_t>(d_.params.size())] = static_cast<int>(column);
+        }
+        lastColumn_ = column;
         d_.params.push_back(p);
         ++Access::ParamCount(d_.keywords.back());
     }
@@ -192,6 +201,8 @@ private:
     const char* p_;
     const char* end_;
     const char* lineStart_;
+    const char* valueStart_ = nullptr; // where the value being read begins
+    std::size_t lastColumn_ = 0;       // of the value before, or of the keyword
     int line_ = 1;
     std::vector<Open> open_;
     // Entries of the open sections, innermost last; a section's run moves to the
@@ -402,6 +413,7 @@ bool Reader::ReadKeyword(const char* name, const char* nameEnd) {
     d_.keywords.push_back(Access::MakeKeyword(&doc_, open_.back().section, Intern(name, nameEnd),
                                               static_cast<std::uint32_t>(d_.params.size()),
                                               PosOf(name)));
+    lastColumn_ = static_cast<std::size_t>(name - lineStart_) + 1;
     SkipBlanks();
     if (LineEnds(p_))
         return true;
@@ -423,6 +435,7 @@ bool Reader::ReadKeyword(const char* name, const char* nameEnd) {
 }
 
 bool Reader::ReadValue() {
+    valueStart_ = p_;
     const char c = *p_;
     if (c == '"')
         return ReadString();

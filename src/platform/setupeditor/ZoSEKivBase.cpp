@@ -179,6 +179,11 @@ CString CZoSEKivBase::GetSectionName() const {
 
 void CZoSEKivBase::AddError(unsigned messageId) { AddError(LoadMessage(messageId)); }
 
+void CZoSEKivBase::AddError(unsigned messageId, const CString& detail) {
+    if (m_root)
+        m_root->ReportError(this, LoadMessage(messageId), detail);
+}
+
 void CZoSEKivBase::AddError(const CString& text) {
     if (m_root)
         m_root->ReportError(this, text);
@@ -220,8 +225,9 @@ CZoSEKivBase* CZoSEKivGlobalBase::GetImportantNode(const CString& key) const {
     return nullptr;
 }
 
-void CZoSEKivGlobalBase::ReportError(CZoSEKivBase* node, const CString& message) {
-    m_errors.push_back({node, message});
+void CZoSEKivGlobalBase::ReportError(CZoSEKivBase* node, const CString& message,
+                                     const CString& detail) {
+    m_errors.push_back({node, message, detail});
 }
 
 void CZoSEKivGlobalBase::SelectTreeItem(CZoSEKivBase*) {}

@@ -82,6 +82,8 @@ public:
     // Validation messages go to the document's error list.
     void AddError(unsigned messageId);
     void AddError(const CString& text);
+    // A fixed message with the reason for this case.
+    void AddError(unsigned messageId, const CString& detail);
 
     // A node counts as touched once the user edited it.
     bool GetHasBeenTouched() const { return m_touched; }
@@ -125,8 +127,12 @@ public:
     struct ErrorEntry {
         CZoSEKivBase* node;
         CString message;
+        CString detail;  // why, where the message is a fixed text ("File is not valid")
+        // "message: detail", or the message alone.
+        CString Text() const { return detail.empty() ? message : message + ": " + detail; }
     };
-    virtual void ReportError(CZoSEKivBase* node, const CString& message);
+    virtual void ReportError(CZoSEKivBase* node, const CString& message,
+                             const CString& detail = {});
     const std::vector<ErrorEntry>& Errors() const { return m_errors; }
     void ClearErrors() { m_errors.clear(); }
 

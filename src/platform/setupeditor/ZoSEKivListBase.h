@@ -226,8 +226,11 @@ public:
         if (!keyword)
             return;
         // No value counts as 0; a value of the wrong type keeps the count (with a warning).
-        int n = kivParamCount(keyword) == 0 ? 0 : GetItemCount();
-        kivGetParam(h, "ZoSEKivListItemCount", &n, 1, 1);
+        int n = 0;
+        if (kivParamCount(keyword) > 0) {
+            n = GetItemCount();
+            kivGetParam(h, "ZoSEKivListItemCount", &n, 1, 1);
+        }
         if (n < 0 || n > kMaxListItemCount) {
             kivWarn(h, "ZoSEKivListItemCount",
                     FormatString("item count %d is not between 0 and %d; kept %d", n,
@@ -243,6 +246,28 @@ public:
             return;
         if (void* own = kivSectionByNameNum(h, GetSectionName().c_str(), 1))
             ReportMissingItems(own);
+    }
+
+    // A count the engine reads beside the list's own (which LoadSize applied) has the last
+    // word; where the two disagree, that is said. A count that is missing or cannot be used
+    // keeps the one held. noun names an item ("dredger").
+    void ReadEngineCount(void* h, const char* keyword, const char* noun) {
+        if (!kivKeywordByNameNum(h, keyword, 1))
+            return;
+        int count = GetItemCount();
+        kivGetParam(h, keyword, &count, 1, 1);
+        if (count < 0 || count > kMaxListItemCount) {
+            kivWarn(h, keyword,
+                    FormatString("%s = %d is not between 0 and %d; kept %d", keyword, count,
+                                 kMaxListItemCount, GetItemCount()));
+            return;
+        }
+        if (kivKeywordByNameNum(h, "ZoSEKivListItemCount", 1) && count != GetItemCount())
+            kivWarn(h, keyword,
+                    FormatString("%s = %d, but ZoSEKivListItemCount = %d; %d %s%s read", keyword,
+                                 count, GetItemCount(), count, noun,
+                                 count == 1 ? " is" : "s are"));
+        SetItemCount(count, 1);
     }
 
     const std::vector<NodeInListOfSyncedLists>& SyncedLists() const { return m_synced; }

@@ -77,9 +77,10 @@ void ZoSEQrdSelection::ReadData(void* h) {
 }
 
 int ZoSEQrdSelection::ValidateData() {
-    if (IsFileValid())
+    CString why;
+    if (IsFileValid(&why))
         return 1;
-    AddError(kMsgFileNotValid);
+    AddError(kMsgFileNotValid, why);
     return 0;
 }
 

@@ -44,7 +44,7 @@ public:
     void WriteData(void* h) override;
     void DescribeKeywords(KeywordSink& sink) override;
     void ReadData(void* h) override;
-    // The file check; "File is not valid" when it fails.
+    // The file check; "File is not valid", with the reason, when it fails.
     int ValidateData() override;
     void SetDefault() override;
 

@@ -224,6 +224,23 @@ TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
                  "        }\n    }\n}\n",
          ":9:13: ZoSEKivListItemCount = 3, but the setup has 1 layer", 1, 0},
         {"empty file", "", ":1:1: no section 'MUD_TRANSPORT_MODULE'", 1, 0},
+        // One value read where two stand: the second would vanish on saving.
+        {"a byte flipped into a comma",
+         "MUD_TRANSPORT_MODULE {\n    mode = 2\n    MODEL_DEFINITION {\n"
+         "        number_of_fractions = 1,005\n        number_of_layers = 1\n    }\n}\n",
+         ":4:33: 'number_of_fractions' in MUD_TRANSPORT_MODULE/MODEL_DEFINITION holds 2 values "
+         "where 1 is read: value 2 is not read, dropped on saving",
+         1, 1},
+        {"a list count given twice",
+         model + "    }\n    OUTPUTS {\n        ZoSEKivListItemCount = 0, 4\n    }\n}\n",
+         ":8:35: 'ZoSEKivListItemCount' in MUD_TRANSPORT_MODULE/OUTPUTS holds 2 values", 1, 1},
+        {"a count without its value",
+         model + "    }\n    DREDGING {\n        number_of_dredgers =\n    }\n}\n",
+         ":8:9: 'number_of_dredgers' has no value; kept 0", 1, 0},
+        {"outputs counted twice, differently",
+         model + "    }\n    OUTPUTS {\n        ZoSEKivListItemCount = 0\n"
+                 "        number_of_outputs = 3\n    }\n}\n",
+         ":9:9: number_of_outputs = 3, but ZoSEKivListItemCount = 0; 3 outputs are read", 1, 0},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.name);
@@ -252,6 +269,29 @@ TEST_F(Cli, WarningsMakeAFileInvalidAndFormatKeepsWhatItWouldDrop) {
         }
     }
     EXPECT_NE(Mudsetup("format --help").out.find("--force"), std::string::npos);
+}
+
+// "File is not valid" is a fixed text; the reason follows it on its line.
+TEST_F(Cli, FileIsNotValidSaysWhyOnTheSameLine) {
+    // The example without its data folder, one output writing into a folder that is not there.
+    std::string text = ReadFile(fs::path(MUD_SOURCE_DIR) / "examples/estuary.setup");
+    const std::string stations = "file_name = 'stations.qrd0'";
+    ASSERT_NE(text.find(stations), std::string::npos);
+    text.replace(text.find(stations), stations.size(), "file_name = 'nowhere/stations.qrd0'");
+    WriteFile(dir / "estuary.setup", text);
+    fs::copy_file(fs::path(MUD_SOURCE_DIR) / "examples/estuary.2dm", dir / "estuary.2dm");
+    const Result r = Mudsetup("validate " + P("estuary.setup"));
+    EXPECT_EQ(r.exitCode, 1);
+    for (const char* line : {
+             "/WAVE_FIELD/Wave field data file: File is not valid: data/waves_mouth.qrd0: the "
+             "file does not exist\n",
+             "/DREDGER_1/MT Dredging file: File is not valid: data/dredger_1.qrd0: the file "
+             "does not exist\n",
+             "MUD_TRANSPORT_MODULE/BOUNDARY_CONDITIONS/BOUNDARY_1/SSC_FRACTION_1: File is not "
+             "valid: data/boundary_sea.qrd0: the file does not exist\n",
+             "/OUTPUT_1: File is not valid: the folder 'nowhere' does not exist\n",
+         })
+        EXPECT_NE(r.out.find(line), std::string::npos) << line << "\nin\n" << r.out;
 }
 
 // Only regular files are read: a device, a FIFO or a folder is refused at once.

@@ -11,9 +11,11 @@
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <string_view>
 
 namespace fs = std::filesystem;
 using namespace datafile;
+using namespace std::literals;
 
 namespace {
 
@@ -110,7 +112,7 @@ TEST(DataFile, EachKindReadsItsLayout) {
 
 TEST(DataFile, BadHeadersGiveTheirPlaceAndWhy) {
     struct Case {
-        const char* text;
+        std::string_view text;
         const char* name;
         int line, column;
         const char* message;  // part of the message
@@ -148,6 +150,12 @@ TEST(DataFile, BadHeadersGiveTheirPlaceAndWhy) {
          "a.qrd1", 7, 1, "no \"points\" line"},
         {"qrd0 1\nstart 2024-01-01 00:00\nstep 60\nsteps 1\nitems 1\nitem a 100084\nvalues 3\n",
          "a.qrd0", 7, 8, "stands alone"},
+        // Only the escapes the format defines; no NUL byte in a text, quoted or not.
+        {"qrd0 1\ntitle \"a\\qb\"\n", "a.qrd0", 2, 9, "unknown escape \"\\q\""},
+        {"qrd0 1\nitem \"h\\\x01\" 100084\n", "a.qrd0", 2, 8, "unknown escape \"\\x01\""},
+        {"qrd0 1\nitem \"a\0b\" 100084\n"sv, "a.qrd0", 2, 8, "a NUL byte"},
+        {"qrd0 1\nitem a\0b 100084\n"sv, "a.qrd0", 2, 7, "a NUL byte"},
+        {"qrd0 1\n\0\n"sv, "a.qrd0", 2, 1, "a NUL byte"},
     };
     for (const Case& c : cases) {
         HeaderResult r = ParseHeader(c.text, c.name);
@@ -159,7 +167,12 @@ TEST(DataFile, BadHeadersGiveTheirPlaceAndWhy) {
         EXPECT_NE(r.error->message.find(c.message), std::string::npos)
             << c.text << " -> " << r.error->ToString();
     }
-    (void)base;
+    // What the format defines still reads, and a NUL byte in a comment is no text.
+    const HeaderResult r = ParseHeader(base + "title \"q\\\"b\\\\s\\nn\\tt\" # \0\n"s +
+                                           "items 1\nitem a 100084\nvalues\n",
+                                       "a.qrd0");
+    ASSERT_FALSE(r.error) << r.error->ToString();
+    EXPECT_EQ(r.header->title, "q\"b\\s\nn\tt");
 }
 
 TEST(DataFile, ValuesAreReadForTheItemsAndPointAskedAndCounted) {
@@ -286,6 +299,10 @@ TEST(DataFile, PointFilesTakeXYZAndAnOptionalName) {
     r = ParseXyz("1 two 3\n", "p.xyz");
     ASSERT_TRUE(r.error);
     EXPECT_EQ(r.error->column, 3);
+    r = ParseXyz("1 2 3 pier\n1 2 3 a\0b\n"sv, "p.xyz");
+    ASSERT_TRUE(r.error);
+    EXPECT_EQ(r.error->ToString(), "p.xyz:2:8: a NUL byte (0x00) in the point's name");
+    EXPECT_TRUE(r.points.empty());
 }
 
 TEST_F(DataFileDir, FilesOnDiskMissingFoldersAndUnreadable) {

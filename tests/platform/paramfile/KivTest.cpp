@@ -5,6 +5,8 @@
 
 #include <climits>
 #include <cmath>
+#include <string>
+#include <vector>
 
 using namespace paramfile;
 
@@ -121,7 +123,7 @@ TEST(Kiv, OccurrenceAndIndexSelectTheValue) {
 }
 
 TEST(Kiv, MissingValuesLeaveTargetsSilently) {
-    auto doc = Parse("S {\n  k = 1\n  e =\n}\n");
+    auto doc = Parse("S {\n  k = 1\n}\n");
     void* s = Sec(*doc, "S");
     int v = 77;
     kivGetParam(nullptr, "k", &v, 1, 1);
@@ -129,7 +131,6 @@ TEST(Kiv, MissingValuesLeaveTargetsSilently) {
     kivGetParam(s, "k", &v, 2, 1);
     kivGetParam(s, "k", &v, 1, 2);
     kivGetParam(s, "k", &v, 1, 0);
-    kivGetParam(s, "e", &v, 1, 1);
     kivGetParam(kivSectionByNameNum(s, "None", 1), "k", &v, 1, 1);
     EXPECT_EQ(v, 77);
     std::string str = "kept";
@@ -187,6 +188,112 @@ TEST(Kiv, WrongTypesLeaveTargetsAndWarnAtTheKeyword) {
         "mud.par:8:3: 'pair' value 2 expects a number, found a string",
     };
     EXPECT_EQ(got, want);
+}
+
+// What a reader took of a keyword decides what is reported: the values past the last one
+// read, at the first of them, as content that saving drops.
+TEST(Kiv, ValuesPastTheLastOneReadAreReportedAtTheFirstOfThem) {
+    struct Case {
+        const char* line;              // the keyword's line in section A
+        void (*read)(void* a);         // how the section's reader takes it
+        const char* report;            // UnreadEntries' one message, or "" for none
+    };
+    const Case cases[] = {
+        {"n = 3, 4", [](void* a) { int v = 0; kivGetParam(a, "n", &v, 1, 1); },
+         "mud.par:2:12: 'n' in A holds 2 values where 1 is read: value 2 is not read, dropped "
+         "on saving"},
+        {"e = 1.0, 2, 3", [](void* a) { double v = 0; kivGetParam(a, "e", &v, 1, 1); },
+         "mud.par:2:14: 'e' in A holds 3 values where 1 is read: values 2 to 3 are not read, "
+         "dropped on saving"},
+        // A byte flipped into a comma splits a coordinate.
+        {"x = 497500.0,005", [](void* a) { double v = 0; kivGetParam(a, "x", &v, 1, 1); },
+         "mud.par:2:18: 'x' in A holds 2 values"},
+        {"s = \"a, b\", 'c'", [](void* a) { std::string v; kivGetParam(a, "s", &v, 1, 1); },
+         "mud.par:2:17: 's' in A holds 2 values"},
+        {"f = 'a.qrd0', 'b'", [](void* a) { std::string v; kivGetParamFilename(a, "f", &v, 1, 1); },
+         "mud.par:2:19: 'f' in A holds 2 values"},
+        {"w = 1.0, 2.0, 3.0",
+         [](void* a) {
+             void* k = kivKeywordByNameNum(a, "w", 1);
+             kivGetDouble(kivParamByNum(k, 1));
+             kivGetDouble(kivParamByNum(k, 2));
+         },
+         "mud.par:2:19: 'w' in A holds 3 values where 2 are read: value 3 is not read"},
+        {"items = 1, 2, 3, 4, 5",
+         [](void* a) { int v[4] = {}; kivGetListParam(a, "items", 1, "iiii", &v[0], &v[1], &v[2], &v[3]); },
+         "mud.par:2:25: 'items' in A holds 5 values where 4 are read"},
+        // Read whole, by value or by a list longer than the values.
+        {"p = 1, 2", [](void* a) { int v = 0; kivGetParam(a, "p", &v, 1, 2); kivGetParam(a, "p", &v, 1, 1); }, ""},
+        {"q = 1", [](void* a) { int v[3] = {}; kivGetListParam(a, "q", 1, "iii", &v[0], &v[1], &v[2]); }, ""},
+        // Looked at but no value taken: the reader only asked whether it is there.
+        {"flag = 1, 2", [](void* a) { kivParamCount(kivKeywordByNameNum(a, "flag", 1)); }, ""},
+        {"none =", [](void* a) { int v = 0; kivGetParam(a, "none", &v, 1, 1); }, ""},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.line);
+        auto doc = Parse(std::string("A {\n    ") + c.line + "\n}\n");
+        void* a = Sec(*doc, "A");
+        c.read(a);
+        std::vector<std::string> got;
+        for (const Diagnostic& d : UnreadEntries(*static_cast<const Section*>(a), "A"))
+            got.push_back(d.ToString());
+        if (*c.report) {
+            ASSERT_EQ(got.size(), 1u);
+            EXPECT_EQ(got[0].rfind(c.report, 0), 0u) << got[0];
+        } else {
+            EXPECT_EQ(got, std::vector<std::string>{});
+        }
+    }
+}
+
+TEST(Kiv, ValuesFarAlongALineAndCopiedValuesKeepTheirPlace) {
+    // Past the 16 bits a value's column is kept aside.
+    const std::string wide(70000, 'w');
+    auto doc = Parse("A {\n    s = \"" + wide + "\", 1, 2\n}\n");
+    void* a = Sec(*doc, "A");
+    std::string v;
+    kivGetParam(a, "s", &v, 1, 1);
+    const std::vector<Diagnostic> unread = UnreadEntries(*static_cast<const Section*>(a), "A");
+    ASSERT_EQ(unread.size(), 1u);
+    EXPECT_EQ(unread[0].pos.line, 2);
+    EXPECT_EQ(unread[0].pos.column, 70013);
+    // A copy is built, not read: its values stand where the keyword does.
+    Document copy;
+    Builder(copy).CopySection(*static_cast<const Section*>(a));
+    const Keyword& k = copy.Root().SectionAt(0).KeywordAt(0);
+    EXPECT_EQ(k.ParamPos(2).column, 0);
+    EXPECT_EQ(doc->Root().SectionAt(0).KeywordAt(0).ParamPos(2).column, 70016);
+}
+
+// A keyword without values where one is read keeps the target's value, and says so.
+TEST(Kiv, AKeywordWithoutAValueIsReportedWithWhatWasKept) {
+    auto doc = Parse("A {\n    i =\n    d =\n    b =\n    s =\n    f =\n    l =\n    k =\n}\n");
+    void* a = Sec(*doc, "A");
+    int i = 7;
+    double d = 0.25;
+    bool b = true;
+    std::string s = "x", f = "a.qrd0";
+    kivGetParam(a, "i", &i, 1, 1);
+    kivGetParam(a, "d", &d, 1, 2);
+    kivGetParam(a, "b", &b, 1, 1);
+    kivGetParam(a, "s", &s, 1, 1);
+    kivGetParamFilename(a, "f", &f, 1, 1);
+    // Lists and counted reads ask for the count first: their readers speak for themselves.
+    kivGetListParam(a, "l", 1, "i", &i);
+    EXPECT_EQ(kivParamByNum(kivKeywordByNameNum(a, "k", 1), 1), nullptr);
+    kivGetParam(a, "absent", &i, 1, 1);
+    EXPECT_EQ(i, 7);
+    EXPECT_EQ(s, "x");
+    std::vector<std::string> got;
+    for (const Diagnostic& w : doc->Warnings())
+        got.push_back(w.ToString());
+    EXPECT_EQ(got, (std::vector<std::string>{
+                       "mud.par:2:5: 'i' has no value; kept 7",
+                       "mud.par:3:5: 'd' has no value; kept 0.25",
+                       "mud.par:4:5: 'b' has no value; kept true",
+                       "mud.par:5:5: 's' has no value; kept \"x\"",
+                       "mud.par:6:5: 'f' has no value; kept 'a.qrd0'",
+                   }));
 }
 
 TEST(Kiv, WarnPointsAtKeywordOrSection) {
