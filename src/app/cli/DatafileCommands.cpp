@@ -482,8 +482,10 @@ int InfoJson(const std::string& file, bool headerOnly) {
         std::string extent = "null";
         if (!r.points.empty()) {
             extent.clear();
-            for (auto [axis, m] : {std::pair{"x", &datafile::XyzPoint::x}, std::pair{"y", &datafile::XyzPoint::y},
-                                   std::pair{"z", &datafile::XyzPoint::z}}) {
+            for (const auto& [axis, member] :
+                 {std::pair{"x", &datafile::XyzPoint::x}, std::pair{"y", &datafile::XyzPoint::y},
+                  std::pair{"z", &datafile::XyzPoint::z}}) {
+                const auto m = member; // clang 14 cannot capture a structured binding
                 const auto [lo, hi] = std::minmax_element(r.points.begin(), r.points.end(),
                                                           [m](const auto& a, const auto& b) { return a.*m < b.*m; });
                 extent += std::string(extent.empty() ? "{" : ", ") + "\"" + axis + "_min\": " +
