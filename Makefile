@@ -78,6 +78,8 @@ fuzz-ci: build/fuzz/build.ninja
 	build/fuzz/fuzz/mesh_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-mesh fuzz/corpus-mesh
 	mkdir -p build/fuzz/corpus-datafile
 	build/fuzz/fuzz/datafile_fuzz -max_total_time=60 -rss_limit_mb=2048 build/fuzz/corpus-datafile fuzz/corpus-datafile
+	mkdir -p build/fuzz/corpus-netcdf
+	build/fuzz/fuzz/netcdf_header_fuzz -max_total_time=60 -rss_limit_mb=2048 -malloc_limit_mb=512 -max_len=65536 build/fuzz/corpus-netcdf fuzz/corpus-netcdf
 
 format:
 	git ls-files '*.cpp' '*.h' | xargs clang-format -i

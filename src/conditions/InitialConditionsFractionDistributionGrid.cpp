@@ -2,10 +2,6 @@
 
 #include <QHeaderView>
 
-namespace {
-constexpr int kColumnWidth = 70;
-}
-
 CInitialConditionsFractionDistributionGrid::CInitialConditionsFractionDistributionGrid(
     QWidget* parent)
     : CFemGridWnd(parent) {
@@ -15,7 +11,6 @@ CInitialConditionsFractionDistributionGrid::CInitialConditionsFractionDistributi
 void CInitialConditionsFractionDistributionGrid::Initialize(
     CZoSEDlgBase* dialog, CInitialConditionsFractionDistributionKiv* list) {
     CFemGridWnd::Initialize(dialog, list);
-    verticalHeader()->setFixedWidth(kColumnWidth);
     QFont bold = verticalHeader()->font();
     bold.setBold(true);
     verticalHeader()->setFont(bold);
@@ -32,9 +27,6 @@ void CInitialConditionsFractionDistributionGrid::SetColumns() {
     for (int j = 1; j <= fractions; ++j)
         headings.push_back(FormatString("Fraction %d", j));
     SetColumnHeadings(headings);
-    Redraw();
-    for (int j = 0; j < fractions; ++j)
-        setColumnWidth(j, kColumnWidth);
 }
 
 void CInitialConditionsFractionDistributionGrid::GetStyleRowCol(int row, int col,

@@ -2,7 +2,6 @@
 
 #include "MTBoundaryConditionsGridDlg.h"
 
-#include <QHeaderView>
 #include <QVBoxLayout>
 
 IMPLEMENT_DYNCREATE_DLG(CMTBoundaryConditionsDlg)
@@ -24,13 +23,8 @@ void CMTBoundaryConditionsDlg::Initialize() {
     HideCaption(1);
 }
 
-// Columns to their contents (the grid samples a bounded number of rows); rows keep the one
-// height of the font, so that ten thousand boundaries open at once.
-void CMTBoundaryConditionsDlg::FitGrid() {
-    m_grid->resizeColumnsToContents();
-    m_grid->verticalHeader()->resizeSection(0, m_grid->verticalHeader()->defaultSectionSize());
-    m_grid->SizeToDialog();
-}
+// Columns to their contents (the grid samples a bounded number of rows).
+void CMTBoundaryConditionsDlg::FitGrid() { m_grid->FitToContents(); }
 
 void CMTBoundaryConditionsDlg::SetData() {
     CZoSEDlgBase::SetData();

@@ -38,6 +38,11 @@ CZoSEKivBase* CMTBoundaryConditionsGridDlg::ItemNodeOfRow(int row) const {
     return component->GetItem(place.fraction);
 }
 
+bool CMTBoundaryConditionsGridDlg::IsTitleRow(int row) const {
+    const RowPlace place = PlaceOfRow(row);
+    return place.component != 0 && place.fraction == 0;
+}
+
 void CMTBoundaryConditionsGridDlg::GetStyleRowCol(int row, int col, CGridCellStyle& style) {
     if (row == 0) {
         CFemGridWnd::GetStyleRowCol(row, col, style);
@@ -59,7 +64,7 @@ void CMTBoundaryConditionsGridDlg::GetStyleRowCol(int row, int col, CGridCellSty
                 title = GetList()->GetItem(place.component)->GetTitle();
             style.SetStatic(title).SetAlign(ZoCellAlign::Center);
         } else {
-            style.SetStatic("").SetReadOnly();
+            style.SetStatic("");  // covered by the title
         }
         return;
     }

@@ -22,6 +22,8 @@ public:
     // The value of an item row, the component of a boundary row; null past the lists.
     CZoSEKivBase* ItemNodeOfRow(int row) const override;
 
+    // A boundary's row is its title across the row, as one cell over the three columns.
+    bool IsTitleRow(int row) const override;
     void GetStyleRowCol(int row, int col, CGridCellStyle& style) override;
     void OnClickedButtonRowCol(int row, int col) override;
 

@@ -17,11 +17,10 @@ CMTBoundaryGisNavigationDlg::CMTBoundaryGisNavigationDlg() {
 
 void CMTBoundaryGisNavigationDlg::Initialize() {
     CMeshNavigationDlg::Initialize();
-    // A click on a boundary opens its form.
+    // A click on a boundary highlights it; its form opens from the menu's "Edit".
     connect(this, &CGisNavigationDlg::featureSelected, this, [this](int overlay, int number) {
-        const auto* list = Section<CMTBoundaryConditionsKiv>();
-        if (overlay == m_layer && list)
-            SelectTreeItem(list->GetItem(number));
+        if (overlay == m_layer)
+            Map()->SelectFeature(overlay, number);
     });
 }
 
@@ -34,7 +33,15 @@ int CMTBoundaryGisNavigationDlg::BuildContextMenu(QMenu& menu, QPointF pixel) {
     for (const CZoMapHit& hit : HitTest(pixel))
         if (hit.overlay == m_layer)
             hits.push_back(hit);
-    return AddFeatureMenu(menu, hits, "Edit");
+    // Each boundary with its fractions, so that a fraction's value opens from the map too.
+    const auto* list = Section<CMTBoundaryConditionsKiv>();
+    return AddFeatureMenu(menu, hits, "Edit", [list](int number) {
+        std::vector<QString> names;
+        if (const CMTBoundaryConditionsComponentKiv* component = list ? list->GetItem(number) : nullptr)
+            for (int f = 1; f <= component->GetItemCount(); ++f)
+                names.push_back(QString::fromStdString(component->GetItem(f)->GetTitle()));
+        return names;
+    });
 }
 
 void CMTBoundaryGisNavigationDlg::OnEditCommand(const QAction* action) {

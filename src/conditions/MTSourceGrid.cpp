@@ -2,19 +2,16 @@
 
 #include "hydro/HDSourcesKiv.h"
 
-#include <QHeaderView>
-
 CMTSourceGrid::CMTSourceGrid(QWidget* parent) : CFemGridWnd(parent) { setObjectName("sourceGrid"); }
 
 void CMTSourceGrid::Initialize(CZoSEDlgBase* dialog, CMTSourceKiv* list, bool nameReadOnly) {
     m_sources = HDSources(list);
     m_nameReadOnly = nameReadOnly;
     CFemGridWnd::Initialize(dialog, list);
+    // The form's widths, at least; wider where the texts ask for it.
+    SetMinimumColumnWidth(0, 50);
+    SetMinimumColumnWidth(kName, 150);
     SetColumnHeadings({"Source No.", "Name", ""});
-    verticalHeader()->setMinimumWidth(50);
-    setColumnWidth(0, 150);
-    horizontalHeader()->resizeSections(QHeaderView::ResizeToContents);
-    setColumnWidth(0, 150);
 }
 
 void CMTSourceGrid::SetSourceRows(int rows) {

@@ -94,8 +94,12 @@ bool CMTDredgingFile::ReadTrack(std::vector<double>& x, std::vector<double>& y,
     std::error_code ec;
     const auto size = std::filesystem::file_size(path, ec);
     const auto time = ec ? std::filesystem::file_time_type() : std::filesystem::last_write_time(path, ec);
-    if (ec)
-        return fail(FileName() + ": the file does not exist");
+    if (ec) {
+        // Not a regular file: the reader says what it is, without reading from it.
+        const datafile::HeaderResult h = datafile::ReadHeader(path);
+        return fail(FileName() + ": " +
+                    (h.error ? h.error->message : CString("the file does not exist")));
+    }
     const TrackKey key{path, size, time, ItemNumber(kX), ItemNumber(kY)};
     auto& cache = TrackCache();
     if (auto it = cache.find(key); it != cache.end()) {

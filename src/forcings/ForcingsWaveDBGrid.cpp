@@ -27,6 +27,10 @@ const char* const CForcingsWaveDBGrid::kFilter =
 
 void CForcingsWaveDBGrid::Initialize(CZoSEDlgBase* dialog, CForcingsWaveDBListKiv* list) {
     m_list = list;
+    // At least as wide as the form's columns were drawn: the values, a file name, the button.
+    const int widths[] = {75, 75, 75, 125, 25};
+    for (int c = 0; c < 5; ++c)
+        SetMinimumColumnWidth(c + 1, widths[c]);
     CFemGridWnd::Initialize(dialog, list);
     SetColumnHeadings({"No.", "Wind speed", "Wind direct.", "Water level", "File name", ""});
     Refresh();
@@ -34,12 +38,6 @@ void CForcingsWaveDBGrid::Initialize(CZoSEDlgBase* dialog, CForcingsWaveDBListKi
 
 void CForcingsWaveDBGrid::Refresh() {
     Redraw();
-    FitColumns();
-    // At least as wide as the form's columns were drawn: the values, a file name, the button.
-    const int widths[] = {75, 75, 75, 125, 25};
-    for (int c = 0; c < 5; ++c)
-        setColumnWidth(c, std::max(columnWidth(c), widths[c]));
-    SizeToDialog();
 }
 
 int CForcingsWaveDBGrid::RowCountFromData() const {

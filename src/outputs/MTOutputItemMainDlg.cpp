@@ -164,8 +164,8 @@ void CMTOutputItemMainDlg::Initialize() {
         o->GeometryToCoordList(true);
     }
     CZoSEDlgBase::Initialize();
-    // Widths from the rows in view: an output may hold a great many points.
-    m_grid->resizeColumnsToContents();
+    // Widths from a sample of the rows: an output may hold a great many points.
+    m_grid->FitToContents();
 }
 
 void CMTOutputItemMainDlg::FillCombos() {

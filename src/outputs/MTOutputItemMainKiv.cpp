@@ -8,6 +8,7 @@
 #include "fem/DomainKiv.h"
 #include "fem/FemEditorUtil.h"
 #include "fem/SimulationPeriodKiv.h"
+#include "mesh/MeshIndex.h"
 #include "paramfile/Kiv.h"
 #include "projection/ZoMapProjection.h"
 #include "paramfile/ParamFile.h"
@@ -18,6 +19,7 @@
 #include <cctype>
 #include <cmath>
 #include <filesystem>
+#include <optional>
 
 namespace {
 
@@ -319,6 +321,42 @@ bool CMTOutputItemMainKiv::CheckData(bool report) {
     if ((m_format == 2 || m_format == 3 || m_type == kTypeMassBudget) && m_polygon.size() < 3)
         return fail(4107);
     return true;
+}
+
+int CMTOutputItemMainKiv::ValidateData() {
+    return CheckData(true) && CheckPointsInMesh() ? 1 : 0;
+}
+
+bool CMTOutputItemMainKiv::CheckPointsInMesh() {
+    CDomainKiv* domain = m_include ? Domain(this) : nullptr;
+    // A mesh that cannot be read is the domain's message.
+    const CMeshIndex* index = UsesPoints() && domain ? domain->NamedMeshIndex() : nullptr;
+    if (!index || m_points.empty())
+        return true;
+    // Points are given in the output's projection, the mesh in the domain's.
+    std::optional<CZoMapProjection> toMesh;
+    if (m_coordinateType != domain->Projection()) {
+        toMesh.emplace(m_coordinateType, domain->Projection());
+        if (!toMesh->IsValid())
+            return true;  // no place on the mesh to check against
+    }
+    const MTOutputPoint* first = nullptr;
+    int outside = 0;
+    for (const MTOutputPoint& p : m_points) {
+        double x = p.x, y = p.y;
+        if ((!toMesh || toMesh->Transform(x, y)) && index->ElementAt(x, y) >= 0)
+            continue;
+        if (!first)
+            first = &p;
+        ++outside;
+    }
+    if (!first)
+        return true;
+    AddError(outside == 1
+                 ? FormatString("Point \"%s\" lies outside the mesh", first->name.c_str())
+                 : FormatString("Point \"%s\" and %d more points lie outside the mesh",
+                                first->name.c_str(), outside - 1));
+    return false;
 }
 
 bool CMTOutputItemMainKiv::ImportXyz(const CString& path, CString* error) {

@@ -116,10 +116,13 @@ public:
     const char* GetDlgRuntimeClass(unsigned code) override;
     void WriteData(void* h) override;
     void ReadData(void* h) override;
-    int ValidateData() override { return CheckData(true) ? 1 : 0; }
+    // CheckData, then the points against the mesh (too slow for CheckData's other callers).
+    int ValidateData() override;
     void Notify(CFemNotifier* notifier, ENotifyMessage message) override;
 
 private:
+    // Every point of a point output in an element of the mesh (when the mesh can be read).
+    bool CheckPointsInMesh();
     void ReadPoints(void* h);
     void ReadArea(void* h);
 

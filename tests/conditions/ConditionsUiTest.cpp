@@ -12,6 +12,8 @@
 #include "watercolumn/WaterColumnUiTestSupport.h"
 #include "widgets/FemInDataDlg.h"
 #include "widgets/HDSourceGisPropSheet.h"
+#include "widgets/ZoDataViewerDlg.h"
+#include "widgets/ZoFileSelectorDlg.h"
 
 #include <QComboBox>
 #include <QGroupBox>
@@ -20,6 +22,7 @@
 #include <QMenu>
 #include <QPushButton>
 #include <QTabWidget>
+#include <QTest>
 
 using namespace uitest;
 using namespace wcui;
@@ -106,8 +109,11 @@ TEST_F(DialogTest, DistributionGridIsLayersByFractionsAndStoresAShare) {
     EXPECT_EQ(Headings(grid), (std::vector<std::string>{"", "Fraction 1", "Fraction 2", "Fraction 3"}));
     EXPECT_EQ(Column(grid, 0), (std::vector<std::string>{"Layer 1", "Layer 2"}));
     EXPECT_EQ(Column(grid, 3), (std::vector<std::string>{"34", "34"}));
-    EXPECT_EQ(grid->columnWidth(0), 70);
-    EXPECT_EQ(grid->verticalHeader()->width(), 70);
+    // Every column as wide as its heading, the row headings as wide as theirs.
+    for (int c = 0; c < 3; ++c)
+        EXPECT_GE(grid->columnWidth(c), grid->horizontalHeader()->fontMetrics().horizontalAdvance("Fraction 1"));
+    EXPECT_GE(grid->verticalHeader()->width(), grid->verticalHeader()->fontMetrics().horizontalAdvance("Layer 2"));
+    EXPECT_FALSE(grid->LastFit().horizontalBar || grid->LastFit().verticalBar);
     EXPECT_TRUE(grid->verticalHeader()->font().bold());
 
     EnterInCell(grid, 2, 1, "40");
@@ -146,6 +152,10 @@ TEST_F(DialogTest, BoundaryConditionListViewLaysOutABlockPerBoundary) {
     EXPECT_EQ(Column(grid, 2), (std::vector<std::string>{"", "Go to...", "Go to...", "",
                                                          "Go to...", "Go to..."}));
     EXPECT_TRUE(grid->CellStyle(2, 1).readOnly);
+    // A boundary's row is its title drawn across the row, not a heading beside grey cells.
+    EXPECT_TRUE(grid->IsTitleRow(1) && grid->IsTitleRow(4));
+    EXPECT_FALSE(grid->IsTitleRow(2) || grid->IsTitleRow(6));
+    EXPECT_FALSE(grid->CellStyle(1, 1).readOnly || grid->CellStyle(1, 2).readOnly);
 
     ClickCell(grid, 6, 2);
     EXPECT_EQ(host.selected, (std::vector<CZoSEKivBase*>{
@@ -263,6 +273,13 @@ TEST_F(DialogTest, TenThousandBoundariesOpenInTheListView) {
     EXPECT_EQ(CellText(grid, 89983, 0), "B9999");
     EXPECT_EQ(CellText(grid, 90000, 0), "Fraction 8");
     EXPECT_TRUE(grid->LastFit().verticalBar);
+    // The corner's heading and the titles of boundaries far down the list are shown whole.
+    const QFontMetrics fm(grid->horizontalHeader()->font());
+    const int rowWidth = grid->verticalHeader()->width() + grid->horizontalHeader()->length();
+    EXPECT_LE(fm.horizontalAdvance("Boundary Name"), grid->verticalHeader()->width());
+    EXPECT_LE(fm.horizontalAdvance("B9999"), rowWidth);
+    EXPECT_TRUE(grid->IsTitleRow(89983));
+    EXPECT_FALSE(grid->IsTitleRow(89984));
 }
 
 TEST_F(DialogTest, SourceSheetListsTheHydrodynamicSources) {
@@ -385,4 +402,92 @@ TEST_F(DialogTest, BoundaryMapOpensFormsAndKeepsItsExtent) {
     auto* nextMap = Child<CMTBoundaryGisNavigationDlg>(next.get(), "boundaryMap");
     ASSERT_NE(nextMap, nullptr);
     EXPECT_EQ(CMTBoundaryGisNavigationDlg::SharedView(), shared);
+}
+
+// The data file of a boundary value is chosen and shown as every other data file is.
+TEST_F(DialogTest, BoundaryValueSelectsAndViewsItsDataFile) {
+    auto doc = NewSetup(1, 1, 1);
+    CMTBoundaryConditionsComponentItemKiv* item = MTBoundaryConditions(doc->Module())->GetItem(1)->GetItem(1);
+    item->Type(1);
+    auto dlg = OpenDialog(item, host);
+    auto* form = dynamic_cast<CMTBoundaryConditionsComponentItemDlg*>(dlg.get());
+    ASSERT_NE(form, nullptr);
+    EXPECT_EQ(form->SelectButton()->text(), "Select ...");
+    EXPECT_EQ(form->ViewButton()->text(), "View ...");
+    // A constant has no file; a file not chosen yet cannot be shown.
+    EXPECT_FALSE(form->SelectButton()->isEnabled());
+    Choose(form->FormatBox(), "Varying in time");
+    EXPECT_TRUE(form->SelectButton()->isEnabled());
+    EXPECT_FALSE(form->ViewButton()->isEnabled());
+
+    const std::string path = MUD_SOURCE_DIR "/examples/data/boundary_sea.qrd0";
+    host.Clear();
+    int shown = 0;
+    const ZoFileSelectorHook previous = ZoSetFileSelectorHook([&](CZoFileSelectorDlg& d) {
+        ++shown;
+        d.Prepare();
+        EXPECT_EQ(d.RequestCount(), 1);
+        EXPECT_EQ(d.Request(0).OvuTypes(), (std::vector<long>{100403}));
+        if (shown == 2)
+            return int(QDialog::Rejected);
+        d.ChooseFile(path);
+        EXPECT_TRUE(d.AssignItem(0, 2));
+        d.accept();
+        return d.result();
+    });
+    QTest::mouseClick(form->SelectButton(), Qt::LeftButton);
+    EXPECT_EQ(item->QrdData()->FileName(), path);
+    EXPECT_EQ(item->QrdData()->ItemNumbers(), (std::vector<int>{2}));
+    EXPECT_EQ(item->QrdData()->ItemName(), "mud 2");
+    EXPECT_EQ(host.hints, (std::vector<int>{1}));
+    // Cancel changes nothing.
+    host.Clear();
+    QTest::mouseClick(form->SelectButton(), Qt::LeftButton);
+    ZoSetFileSelectorHook(previous);
+    EXPECT_EQ(shown, 2);
+    EXPECT_TRUE(host.hints.empty());
+
+    ASSERT_TRUE(form->ViewButton()->isEnabled());
+    QTest::mouseClick(form->ViewButton(), Qt::LeftButton);
+    auto* viewer = form->findChild<CZoDataViewerDlg*>();
+    ASSERT_TRUE(viewer);
+    EXPECT_EQ(viewer->Path(), path);
+    EXPECT_EQ(viewer->Items(), (std::vector<int>{2}));
+    viewer->close();
+}
+
+// A click on the boundary map stays on the map and highlights the boundary; "Edit" under the
+// cursor lists the boundary and each of its fractions, and opens the one chosen.
+TEST_F(DialogTest, BoundaryMapClickHighlightsAndEditListsTheFractions) {
+    CSetupDocument::OpenResult r = CSetupDocument::Open(MUD_SOURCE_DIR "/examples/estuary.setup");
+    ASSERT_TRUE(r.document);
+    CMTBoundaryConditionsKiv* bc = MTBoundaryConditions(r.document->Module());
+    CMTBoundaryConditionsPropertySheet::SetInitialSelectedPage(0);
+    host.setupDir = MUD_SOURCE_DIR "/examples";
+    auto dlg = OpenDialog(bc, host);
+    auto* map = Child<CMTBoundaryGisNavigationDlg>(dlg.get(), "boundaryMap");
+    ASSERT_NE(map, nullptr);
+    const int layer = map->BoundaryLayer();
+    ASSERT_GE(layer, 0);
+    map->Map()->FitToMesh();
+
+    emit map->Map()->featureClicked(layer, 2);
+    EXPECT_TRUE(host.selected.empty());
+    EXPECT_EQ(map->Map()->Overlay(layer).selected, 2);
+
+    const CZoMapFeature& sea = map->Map()->Overlay(layer).features.at(0);
+    ASSERT_EQ(sea.number, 1);
+    const QPointF middle = sea.points.at(sea.points.size() / 2);
+    QMenu menu;
+    EXPECT_EQ(map->BuildContextMenu(menu, map->Map()->ToPixel(middle.x(), middle.y())), 1 + 3);
+    QMenu* edit = menu.actions().back()->menu();
+    ASSERT_TRUE(edit);
+    EXPECT_EQ(edit->title(), "Edit");
+    QStringList texts;
+    for (const QAction* a : edit->actions())
+        texts << a->text();
+    EXPECT_EQ(texts, (QStringList{"Sea boundary", "Sea boundary: Fraction 1", "Sea boundary: Fraction 2",
+                                  "Sea boundary: Fraction 3"}));
+    map->OnEditCommand(edit->actions().at(2));
+    EXPECT_EQ(host.selected, (std::vector<CZoSEKivBase*>{bc->GetItem(1)->GetItem(2)}));
 }

@@ -458,7 +458,11 @@ TEST(MTOutputItemMainKiv, ValidationMessages) {
         o->FileName(folder + "/out.qrd0");
         c.change(*o);
         doc->ValidateAll();
-        const std::vector<std::string> messages = Messages(*doc);
+        // The domain names a mesh that is not there: its message is the domain's.
+        std::vector<std::string> messages;
+        for (const std::string& m : Messages(*doc))
+            if (m.rfind("DOMAIN: The mesh cannot be read", 0) != 0)
+                messages.push_back(m);
         if (*c.message) {
             EXPECT_EQ(messages, (std::vector<std::string>{std::string("MUD_TRANSPORT_MODULE/OUTPUTS/OUTPUT_1: ") +
                                                           c.message}));

@@ -3,12 +3,12 @@
 
 #include "datafile/DataFile.h"
 #include "fem/UnitUtil.h"
+#include "fileio/GuardedFile.h"
 
 #include <algorithm>
 #include <cctype>
 #include <charconv>
 #include <cmath>
-#include <fstream>
 #include <iostream>
 #include <memory>
 #include <optional>
@@ -163,11 +163,12 @@ struct Csv {
 };
 
 std::optional<Csv> ReadCsv(const std::string& path, std::string& error) {
-    std::ifstream in(path, std::ios::binary);
-    if (!in) {
-        error = path + ": the file cannot be read";
+    std::string text;
+    if (const auto failure = fileio::ReadWholeFile(path, fileio::kCsvFiles, text)) {
+        error = path + ": " + failure->Text();
         return std::nullopt;
     }
+    std::istringstream in(std::move(text));
     Csv csv;
     bool timeColumn = false, first = true;
     std::string line;

@@ -38,6 +38,7 @@
 #include <QLineEdit>
 #include <QMenuBar>
 #include <QPushButton>
+#include <QRegularExpression>
 #include <QScrollArea>
 #include <QSettings>
 #include <QSignalBlocker>
@@ -73,12 +74,22 @@ void SetNode(QTreeWidgetItem* item, CZoSEKivBase* node) {
     item->setData(0, kNodeRole, QVariant::fromValue(reinterpret_cast<quintptr>(node)));
 }
 
-// A title for the tree; nameless nodes fall back to their section name.
+// A title as the modeller knows the place: the module's "MT " prefix of data-file nodes
+// goes, and a nameless item of a list is called by its kind and number, as its grid calls
+// it ("BED_DISTRIBUTION_LAYER_1" is "Layer 1").
 QString DisplayTitle(const CZoSEKivBase* node) {
     QString title = Q(node->GetTitle());
-    if (title.isEmpty())
-        title = Q(node->GetSectionName());
-    return title.isEmpty() ? QObject::tr("(unnamed)") : title;
+    if (title.startsWith(QStringLiteral("MT ")))
+        title.remove(0, 3);
+    if (!title.isEmpty())
+        return title;
+    const QString section = Q(node->GetSectionName());
+    static const QRegularExpression numbered(QStringLiteral("(?:^|_)([A-Za-z]+)_([0-9]+)$"));
+    if (const QRegularExpressionMatch m = numbered.match(section); m.hasMatch()) {
+        const QString kind = m.captured(1).toLower();
+        return kind.left(1).toUpper() + kind.mid(1) + ' ' + m.captured(2);
+    }
+    return section.isEmpty() ? QObject::tr("(unnamed)") : section;
 }
 
 // Asks for the numbers of fractions and layers of a new setup.
@@ -235,6 +246,8 @@ void CEditorWindow::BuildLayout() {
     m_messages->setHeaderLabels({tr("Section"), tr("Message")});
     m_messages->setRootIsDecorated(false);
     m_messages->setUniformRowHeights(true);
+    // A long place keeps its end in view: the item that the message is about.
+    m_messages->setTextElideMode(Qt::ElideMiddle);
     m_messages->header()->setSectionResizeMode(0, QHeaderView::Interactive);
     m_messages->header()->resizeSection(0, 380);
     m_messages->header()->setStretchLastSection(true);
@@ -408,7 +421,12 @@ void CEditorWindow::RestoreState(const std::function<void()>& change, bool struc
     CloseDialog(false);
     m_currentNode = nullptr;
     change();
-    if (structural)
+    ShowAgain(path, hadNode, structural);
+}
+
+void CEditorWindow::ShowAgain(const CString& path, bool hadNode, bool rebuild) {
+    m_restoring = true;
+    if (rebuild)
         RebuildTree();
     else
         RefreshTree();
@@ -517,6 +535,9 @@ bool CEditorWindow::OpenFile(const QString& path) {
     SetDocument(std::move(opened.document), QFileInfo(path).absoluteFilePath());
     AddRecentFile(m_path);
     ShowReadWarnings(opened.warnings);
+    // A setup that disagrees with its files (a mesh or data file gone) says so at once.
+    if (!RunValidation(true))
+        m_messagesDock->show();
     if (opened.warnings.empty())
         statusBar()->showMessage(tr("Opened %1").arg(path), 5000);
     return true;
@@ -587,7 +608,22 @@ bool CEditorWindow::SaveFile(const QString& path) {
             return false;
     }
     std::string error;
-    if (!m_doc->SaveAs(path.toStdString(), &error)) {
+    bool changed = false;
+    // Saving may rewrite file names; the text before tells (saving writes it whole anyway).
+    const std::string before = m_doc->ToText();
+    bool saved = m_doc->SaveAs(path.toStdString(), &error, &changed);
+    if (!saved && changed) {
+        const QMessageBox::StandardButton answer =
+            Ask({QMessageBox::Warning, tr("Save Setup"),
+                 tr("%1 was changed by another program since it was opened or saved here.\n\n"
+                    "Overwrite it with this setup?")
+                     .arg(path),
+                 QMessageBox::Save | QMessageBox::Cancel});
+        if (answer != QMessageBox::Save)
+            return false;
+        saved = m_doc->SaveAs(path.toStdString(), &error, nullptr, true);
+    }
+    if (!saved) {
         Ask({QMessageBox::Critical, tr("Save Setup"),
              tr("The setup could not be saved to %1:\n\n%2\n\nThe file was not changed.")
                  .arg(path, Q(error)),
@@ -595,12 +631,25 @@ bool CEditorWindow::SaveFile(const QString& path) {
         return false;
     }
     m_path = QFileInfo(path).absoluteFilePath();
-    m_undo->setClean();
-    SetModified(false);
-    AddRecentFile(m_path);
     // The file now holds what the setup holds: what reading said of the old one is past
     // (the list shows it until the next validation).
     m_readWarnings.clear();
+    if (m_doc->ToText() != before) {
+        // Saved into another folder, relative file names were rewritten to name the same
+        // files from there: the form shows the new names, the states before hold the old
+        // ones (no longer right from here), and the files are checked from the new place.
+        CloseDialog(false);
+        const CString shown = m_currentNode ? NodePath(m_currentNode) : CString();
+        const bool hadNode = m_currentNode != nullptr;
+        m_currentNode = nullptr;
+        ShowAgain(shown, hadNode);
+        StartNewHistory();
+        RunValidation(false);
+    } else {
+        m_undo->setClean();
+        SetModified(false);
+    }
+    AddRecentFile(m_path);
     const int problems = static_cast<int>(m_doc->Errors().size());
     statusBar()->showMessage(problems ? tr("Saved %1 with %2")
                                             .arg(path, Plural(problems, "validation message", "validation messages"))
@@ -670,6 +719,12 @@ void CEditorWindow::FillMessages(bool valid) {
         item->setText(0, tr("The setup is valid."));
         item->setIcon(0, style()->standardIcon(QStyle::SP_DialogApplyButton));
         item->setFirstColumnSpanned(true);
+    } else {
+        // The places shown whole, as far as half the list's width allows.
+        m_messages->resizeColumnToContents(0);
+        const int widest = m_messages->header()->sectionSize(0);
+        m_messages->header()->resizeSection(
+            0, std::clamp(widest, 380, std::max(380, m_messages->viewport()->width() / 2)));
     }
 }
 
@@ -894,9 +949,25 @@ void CEditorWindow::OnCurrentItemChanged(QTreeWidgetItem* item, QTreeWidgetItem*
     // stays on that form, where the user can mend it.
     if (QWidget* refused = ZoJustRefused(); refused && previous && m_scroll->widget() &&
                                             m_scroll->widget()->isAncestorOf(refused)) {
-        const QSignalBlocker block(m_tree);
-        m_tree->setCurrentItem(previous);
+        {
+            const QSignalBlocker block(m_tree);
+            m_tree->setCurrentItem(previous);
+        }
         refused->setFocus();
+        // The click goes on to select the item it hit once this returns: the tree is put
+        // back on the form's node after it.
+        QMetaObject::invokeMethod(
+            this,
+            [this] {
+                QTreeWidgetItem* shown = ItemOf(m_currentNode);
+                if (!shown)
+                    return;
+                const QSignalBlocker block(m_tree);
+                m_tree->setCurrentItem(shown);
+                m_tree->clearSelection();
+                shown->setSelected(true);
+            },
+            Qt::QueuedConnection);
         return;
     }
     CZoSEKivBase* node = NodeOf(item);
@@ -952,6 +1023,8 @@ void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     if (dialog) {
         layout->addWidget(dialog);
         m_dialog = dialog;
+        // The help pane follows the page on show as it follows the tree.
+        connect(dialog, &CZoSEDlgBase::helpTopicChanged, this, [this] { ShowHelpOfSelection(); });
         dialog->Attach(node, this);
         m_initializing = true;
         dialog->Initialize();
@@ -1005,8 +1078,8 @@ void CEditorWindow::RefreshDialog() {
 }
 
 unsigned long CEditorWindow::CurrentHelpId() const {
-    if (m_dialog && m_dialog->GetHelpID())
-        return m_dialog->GetHelpID();
+    if (m_dialog && m_dialog->CurrentHelpID())
+        return m_dialog->CurrentHelpID();
     if (const auto* help = dynamic_cast<const CFemHelpBase*>(m_currentNode))
         return help->GetHelpID();
     if (!m_currentNode && m_tree->currentItem() == m_hostItem)

@@ -114,6 +114,9 @@ private:
     QString EditName(CZoSEDlgBase* dialog, int hint) const;
     // Runs a change of the history (undo, redo); the tree and the form follow.
     void RestoreState(const std::function<void()>& change, bool structural);
+    // The tree and the form again after the nodes were read anew (or only their values, when
+    // rebuild is false); the form of the node at path when there was one.
+    void ShowAgain(const CString& path, bool hadNode, bool rebuild = true);
     // Takes in changes that were made without an update hint (validation corrects some).
     void SyncState(const QString& name);
     void StartNewHistory();

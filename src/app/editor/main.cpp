@@ -3,8 +3,10 @@
 //   mudsetup-editor --screenshot OUT.png [--select PATH] FILE
 #include "EditorWindow.h"
 #include "PreferencesDialog.h"
+#include "fileio/GuardedFile.h"
 
 #include <QApplication>
+#include <QBuffer>
 #include <QIcon>
 #include <QStyleFactory>
 #include <QTimer>
@@ -99,9 +101,15 @@ int TakeScreenshot(CEditorWindow& window, const Options& o) {
     window.show();
     for (int i = 0; i < 5; ++i)
         QApplication::processEvents();
-    const QImage image = window.grab().toImage();
-    if (!image.save(QString::fromStdString(o.screenshot), "PNG")) {
-        std::fprintf(stderr, "mudsetup-editor: cannot write '%s'\n", o.screenshot.c_str());
+    // Encoded in memory, then written as every file is: only over a regular file, atomically.
+    QByteArray png;
+    QBuffer buffer(&png);
+    buffer.open(QIODevice::WriteOnly);
+    std::string error = "cannot write '" + o.screenshot + "'";
+    if (!window.grab().toImage().save(&buffer, "PNG") ||
+        !fileio::WriteFileAtomic(o.screenshot, std::string_view(png.constData(), static_cast<size_t>(png.size())),
+                                 &error)) {
+        std::fprintf(stderr, "mudsetup-editor: %s\n", error.c_str());
         return 2;
     }
     return 0;

@@ -1,6 +1,7 @@
 #include "DataFile.h"
 
 #include "fem/UnitUtil.h"
+#include "fileio/GuardedFile.h"
 
 #include <algorithm>
 #include <cctype>
@@ -9,7 +10,7 @@
 #include <cmath>
 #include <cstdio>
 #include <cstring>
-#include <filesystem>
+#include <functional>
 #include <limits>
 #include <memory>
 
@@ -56,7 +57,7 @@ std::string FormatNumber(double v) {
 class Source {
 public:
     explicit Source(std::string_view text) : m_data(text.data()), m_end(text.size()) {}
-    explicit Source(std::FILE* file) : m_file(file), m_block(1 << 16) {}
+    explicit Source(fileio::InFile& file) : m_file(&file), m_block(1 << 16) {}
 
     int Get() {
         if (m_pos == m_end && !Refill())
@@ -85,18 +86,18 @@ private:
     bool Refill() {
         if (!m_file)
             return false;
-        const std::size_t n = std::fread(m_block.data(), 1, m_block.size(), m_file);
-        if (n == 0) {
-            m_failed = std::ferror(m_file) != 0;
+        const std::ptrdiff_t n = m_file->Read(m_block.data(), m_block.size());
+        if (n <= 0) {
+            m_failed = n < 0;
             return false;
         }
         m_data = m_block.data();
         m_pos = 0;
-        m_end = n;
+        m_end = static_cast<std::size_t>(n);
         return true;
     }
 
-    std::FILE* m_file = nullptr;
+    fileio::InFile* m_file = nullptr;
     std::vector<char> m_block;
     const char* m_data = nullptr;
     std::size_t m_pos = 0, m_end = 0;
@@ -488,28 +489,20 @@ HeaderResult HeaderParser::Run() {
                      "the header ends without a \"values\" line (the file is cut short)"));
 }
 
-std::optional<Error> OpenError(const std::string& path) {
-    std::error_code ec;
-    const auto status = std::filesystem::status(path, ec);
-    if (!std::filesystem::exists(status))
+// Data files and point files are opened alike; the messages keep the words the selector
+// and the command line have always shown.
+std::optional<Error> OpenFile(fileio::InFile& file, const std::string& path,
+                              const fileio::FileKind& kind = fileio::kDataFiles) {
+    const std::optional<fileio::Failure> failure = file.Open(path, kind);
+    if (!failure)
+        return std::nullopt;
+    if (failure->err == ENOENT)
         return Error{path, 0, 0, "the file does not exist"};
-    if (std::filesystem::is_directory(status))
+    if (failure->err == EISDIR)
         return Error{path, 0, 0, "this is a folder, not a data file"};
-    return std::nullopt;
-}
-
-struct FileCloser {
-    void operator()(std::FILE* f) const { std::fclose(f); }
-};
-using FilePtr = std::unique_ptr<std::FILE, FileCloser>;
-
-FilePtr OpenFile(const std::string& path, std::optional<Error>& error) {
-    if ((error = OpenError(path)))
-        return nullptr;
-    FilePtr f(std::fopen(path.c_str(), "rb"));
-    if (!f)
-        error = Error{path, 0, 0, std::string("the file cannot be read: ") + std::strerror(errno)};
-    return f;
+    if (!failure->reason.empty())
+        return Error{path, 0, 0, "the file " + failure->reason};
+    return Error{path, 0, 0, std::string("the file cannot be read: ") + std::strerror(failure->err)};
 }
 
 ValuesResult ParseValuesFrom(Source& src, const std::string& name, const ValuesRequest& req,
@@ -702,13 +695,10 @@ std::int64_t Header::ValuesPerStep() const {
 
 HeaderResult ReadHeader(const std::string& path) {
     HeaderResult r;
-    std::optional<Error> error;
-    FilePtr f = OpenFile(path, error);
-    if (!f) {
-        r.error = std::move(error);
+    fileio::InFile file;
+    if ((r.error = OpenFile(file, path)))
         return r;
-    }
-    Source src(f.get());
+    Source src(file);
     return HeaderParser(src, path).Run();
 }
 
@@ -718,14 +708,13 @@ HeaderResult ParseHeader(std::string_view text, const std::string& name) {
 }
 
 ValuesResult ReadValues(const std::string& path, const ValuesRequest& request, Header* header) {
-    std::optional<Error> error;
-    FilePtr f = OpenFile(path, error);
-    if (!f) {
+    fileio::InFile file;
+    if (std::optional<Error> error = OpenFile(file, path)) {
         ValuesResult r;
         r.error = std::move(error);
         return r;
     }
-    Source src(f.get());
+    Source src(file);
     return ParseValuesFrom(src, path, request, header);
 }
 
@@ -735,8 +724,14 @@ ValuesResult ParseValues(std::string_view text, const std::string& name,
     return ParseValuesFrom(src, name, request, header);
 }
 
-std::string FormatDataFile(const Header& h, const std::vector<double>& values) {
-    std::string out = std::string(h.kindWord.empty() ? KindWord(h.kind) : h.kindWord.c_str()) + " 1\n";
+namespace {
+
+// The file's text in pieces: flush takes out whenever it has grown past a block, and once
+// at the end, so that a large file is never held whole.
+void FormatInto(const Header& h, const std::vector<double>& values, std::string& out,
+                const std::function<void(std::string&)>& flush) {
+    constexpr std::size_t kBlock = 1 << 20;
+    out = std::string(h.kindWord.empty() ? KindWord(h.kind) : h.kindWord.c_str()) + " 1\n";
     if (!h.title.empty())
         out += "title " + Quote(h.title) + "\n";
     out += "start " + FormatDateTime(h.time.start) + "\n";
@@ -776,12 +771,28 @@ std::string FormatDataFile(const Header& h, const std::vector<double>& values) {
         out += "# step " + std::to_string(step + 1) + ": " +
                FormatDateTime(h.time.start + static_cast<std::int64_t>(std::llround(h.time.step * static_cast<double>(step)))) + "\n";
         for (std::size_t k = 0; k < items; ++k) {
-            for (std::size_t p = 0; p < perStep && i < values.size(); ++p)
+            for (std::size_t p = 0; p < perStep && i < values.size(); ++p) {
                 out += (p ? " " : "") + FormatNumber(values[i++]);
+                if (out.size() >= kBlock)
+                    flush(out);
+            }
             out += '\n';
         }
+        if (out.size() >= kBlock)
+            flush(out);
     }
-    return out;
+    flush(out);
+}
+
+}  // namespace
+
+std::string FormatDataFile(const Header& h, const std::vector<double>& values) {
+    std::string out, whole;
+    FormatInto(h, values, out, [&whole](std::string& piece) {
+        whole += piece;
+        piece.clear();
+    });
+    return whole;
 }
 
 std::string CheckHeader(const Header& h) {
@@ -809,25 +820,19 @@ bool WriteDataFile(const std::string& path, const Header& header, const std::vec
     if (static_cast<double>(values.size()) != expected)
         return fail("the header announces " + FormatNumber(expected) + " values but " +
                     std::to_string(values.size()) + " are given");
-    const std::string text = FormatDataFile(header, values);
-    const std::string temp = path + ".tmp~";
-    {
-        std::FILE* f = std::fopen(temp.c_str(), "wb");
-        if (!f)
-            return fail(path + ": " + std::strerror(errno));
-        const bool ok = std::fwrite(text.data(), 1, text.size(), f) == text.size();
-        const int saved = errno;
-        if (std::fclose(f) != 0 || !ok) {
-            std::remove(temp.c_str());
-            return fail(path + ": " + std::strerror(ok ? errno : saved));
-        }
-    }
-    std::error_code ec;
-    std::filesystem::rename(temp, path, ec);
-    if (ec) {
-        std::remove(temp.c_str());
-        return fail(path + ": " + ec.message());
-    }
+    fileio::AtomicWriter writer;
+    std::optional<fileio::Failure> failure = writer.Open(path);
+    std::string out;
+    if (!failure)
+        FormatInto(header, values, out, [&](std::string& piece) {
+            if (!failure)
+                failure = writer.Write(piece);
+            piece.clear();
+        });
+    if (!failure)
+        failure = writer.Commit();
+    if (failure)
+        return fail(path + ": " + failure->SystemText());
     return true;
 }
 
@@ -1012,21 +1017,17 @@ XyzResult ParseXyz(std::string_view text, const std::string& name) {
 
 XyzResult ReadXyz(const std::string& path) {
     XyzResult r;
-    std::optional<Error> error;
-    FilePtr f = OpenFile(path, error);
-    if (!f) {
-        r.error = std::move(error);
+    fileio::InFile file;
+    if ((r.error = OpenFile(file, path, fileio::kPointFiles)))
         return r;
-    }
-    std::string text;
-    char buf[1 << 16];
-    std::size_t n;
-    while ((n = std::fread(buf, 1, sizeof buf, f.get())) > 0)
-        text.append(buf, n);
-    if (std::ferror(f.get())) {
+    std::string text(static_cast<std::size_t>(file.Size()), '\0');
+    const std::ptrdiff_t n = file.Read(text.data(), text.size());
+    if (n < 0) {
         r.error = Error{path, 0, 0, "the file cannot be read to its end"};
         return r;
     }
+    // A file that shrank while it was read holds only what was read.
+    text.resize(static_cast<std::size_t>(n));
     return ParseXyz(text, path);
 }
 

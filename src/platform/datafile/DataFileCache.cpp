@@ -1,6 +1,6 @@
 #include "DataFileCache.h"
+#include "fileio/GuardedFile.h"
 
-#include <filesystem>
 #include <map>
 #include <mutex>
 
@@ -9,8 +9,7 @@ namespace datafile {
 namespace {
 
 struct Entry {
-    std::uintmax_t size = 0;
-    std::filesystem::file_time_type modified;
+    fileio::FileIdentity identity;
     std::shared_ptr<const HeaderResult> result;
 };
 
@@ -25,17 +24,9 @@ std::uint64_t g_reads = 0;
 }  // namespace
 
 std::shared_ptr<const HeaderResult> CachedHeader(const std::string& path) {
-    std::error_code ec;
-    const auto status = std::filesystem::status(path, ec);
-    const bool regular = !ec && std::filesystem::is_regular_file(status);
-    std::uintmax_t size = 0;
-    std::filesystem::file_time_type modified{};
-    if (regular) {
-        size = std::filesystem::file_size(path, ec);
-        if (!ec)
-            modified = std::filesystem::last_write_time(path, ec);
-    }
-    if (!regular || ec) {
+    // A file replaced by another of the same size and time is told by its inode.
+    const fileio::FileIdentity identity = fileio::IdentityOf(path);
+    if (!identity.Known()) {
         std::lock_guard lock(g_mutex);
         g_cache.erase(path);
         ++g_reads;
@@ -44,7 +35,7 @@ std::shared_ptr<const HeaderResult> CachedHeader(const std::string& path) {
     {
         std::lock_guard lock(g_mutex);
         const auto it = g_cache.find(path);
-        if (it != g_cache.end() && it->second.size == size && it->second.modified == modified)
+        if (it != g_cache.end() && it->second.identity == identity)
             return it->second.result;
     }
     auto result = std::make_shared<const HeaderResult>(ReadHeader(path));
@@ -57,7 +48,7 @@ std::shared_ptr<const HeaderResult> CachedHeader(const std::string& path) {
     }
     if (g_cache.size() >= kMaxEntries)
         g_cache.clear();
-    g_cache[path] = Entry{size, modified, result};
+    g_cache[path] = Entry{identity, result};
     return result;
 }
 

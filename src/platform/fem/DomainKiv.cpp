@@ -1,8 +1,12 @@
 #include "DomainKiv.h"
 
 #include "BoundaryNamesKiv.h"
+#include "datafile/ZoFileSelector.h"
+#include "mesh/MeshIndex.h"
 #include "mesh/MeshReader.h"
 #include "setupeditor/KivFields.h"
+
+#include <filesystem>
 
 struct DomainFields {
     using F = KivField<CDomainKiv>;
@@ -62,14 +66,16 @@ void CDomainKiv::MeshFile(const CString& file) {
 }
 
 bool CDomainKiv::LoadMesh(const CString& storedName, const std::string& path, std::string* error) {
-    MeshReadResult r = ReadMeshFile(path);
+    const FileStamp stamp = StampOf(path);
+    MeshReadResult r = ReadMeshFile(path); // refuses folders, devices and FIFOs at once
     if (!r.mesh) {
         if (error)
             *error = r.error;
         return false;
     }
     TakeMesh(storedName, r.mesh);
-    m_meshPath = path;
+    m_meshPath = std::filesystem::path(path).lexically_normal().string();
+    m_meshStamp = stamp;
     return true;
 }
 
@@ -94,17 +100,52 @@ void CDomainKiv::TakeMesh(const CString& storedName, MeshPtr mesh) {
     NotifyListeners(kMeshChanged);
 }
 
+CDomainKiv::FileStamp CDomainKiv::StampOf(const std::string& path) {
+    std::error_code ec;
+    const auto status = std::filesystem::status(path, ec);
+    if (ec || !std::filesystem::is_regular_file(status))
+        return {};
+    const auto size = std::filesystem::file_size(path, ec);
+    const auto time = std::filesystem::last_write_time(path, ec);
+    if (ec)
+        return {};
+    return {static_cast<long long>(size), static_cast<long long>(time.time_since_epoch().count())};
+}
+
 MeshPtr CDomainKiv::EnsureMesh(const std::string& path, std::string* error) {
-    if (m_mesh && (m_meshPath.empty() || m_meshPath == path))
-        return m_mesh;
+    if (m_mesh && m_meshPath.empty())
+        return m_mesh;  // taken from a mesh that the caller read
     if (!MeshExist())
         return nullptr;
-    MeshReadResult r = ReadMeshFile(path);
-    m_mesh = r.mesh;
-    m_meshPath = path;
+    // The map and validation resolve the name each their own way; one file is one key.
+    const std::string normal = std::filesystem::path(path).lexically_normal().string();
+    // Validation asks after every edit: a large mesh, or one that fails late, is read once.
+    const FileStamp stamp = StampOf(normal);
+    if (normal != m_meshPath || stamp != m_meshStamp) {
+        MeshReadResult r = ReadMeshFile(normal);
+        m_mesh = r.mesh;
+        m_meshPath = normal;
+        m_meshStamp = stamp;
+        m_meshError = r.error;
+    }
     if (!m_mesh && error)
-        *error = r.error;
+        *error = m_meshError;
     return m_mesh;
+}
+
+MeshPtr CDomainKiv::NamedMesh(std::string* error) {
+    return EnsureMesh(CZoFileSelector(this).AbsolutePath(m_meshFile), error);
+}
+
+const CMeshIndex* CDomainKiv::NamedMeshIndex() {
+    const MeshPtr mesh = NamedMesh();
+    if (!mesh)
+        return nullptr;
+    if (m_indexed != mesh) {
+        m_index = std::make_unique<CMeshIndex>(*mesh);
+        m_indexed = mesh;
+    }
+    return m_index.get();
 }
 
 void CDomainKiv::Projection(const CString& p) {
@@ -166,6 +207,39 @@ int CDomainKiv::ValidateData() {
         AddError("The mesh extent has a minimum above its maximum");
         ok = 0;
     }
+    if (MeshExist()) {
+        std::string error;
+        if (const MeshPtr mesh = NamedMesh(&error))
+            ok &= CheckBoundaries(*mesh) ? 1 : 0;
+        else {
+            AddError("The mesh cannot be read: " + error);
+            ok = 0;
+        }
+    }
+    return ok;
+}
+
+bool CDomainKiv::CheckBoundaries(const CMesh& mesh) {
+    const int stored = m_boundaries->GetItemCount();
+    const int held = static_cast<int>(mesh.boundaries.size());
+    if (stored != held) {
+        AddError(FormatString(held == 1 ? "The mesh has %d open boundary, the setup %d: open the "
+                                          "mesh again to take its boundaries"
+                                        : "The mesh has %d open boundaries, the setup %d: open the "
+                                          "mesh again to take its boundaries",
+                              held, stored));
+        return false;
+    }
+    bool ok = true;
+    for (int i = 1; i <= stored; ++i) {
+        const CString& name = m_boundaries->GetItem(i)->Identifier();
+        const std::string& meshName = mesh.boundaries[static_cast<size_t>(i - 1)].name;
+        if (name != meshName) {
+            AddError(FormatString("Open boundary %d is named \"%s\" in the setup and \"%s\" in the mesh",
+                                  i, name.c_str(), meshName.c_str()));
+            ok = false;
+        }
+    }
     return ok;
 }
 
@@ -173,6 +247,7 @@ void CDomainKiv::SetDefault() {
     DefaultFields(*this, DomainFields::kFields);
     m_mesh.reset();
     m_meshPath.clear();
+    m_meshStamp = {};
 }
 
 CDomainKiv* Domain(const CZoSEKivBase* node) { return GetImportant<CDomainKiv>(node, "Domain"); }

@@ -5,6 +5,7 @@
 #include "setupeditor/ZoSEKivBase.h"
 
 class CBoundaryNamesKiv;
+class CMeshIndex;
 
 struct MeshInfo {
     double xMin = 0, xMax = 0, yMin = 0, yMax = 0, zMin = 0, zMax = 0;
@@ -56,9 +57,14 @@ public:
     // The mesh file (stored as storedName), extent, projection (when the mesh names one) and
     // open boundaries from a mesh, the boundary list following through its list operations.
     void TakeMesh(const CString& storedName, MeshPtr mesh);
-    // The geometry of the mesh already named, read from path (resolved by the caller) once;
-    // the stored extent and boundaries stay as they are. Null with the error when unreadable.
+    // The geometry of the mesh already named, read from path (resolved by the caller) once,
+    // and again only when the file changes (also when it could not be read); the stored
+    // extent and boundaries stay as they are. Null with the error when unreadable.
     MeshPtr EnsureMesh(const std::string& path, std::string* error);
+    // EnsureMesh of the named mesh, a relative name taken against the setup's folder.
+    MeshPtr NamedMesh(std::string* error = nullptr);
+    // The spatial index of NamedMesh, built once for it; null when there is no mesh to use.
+    const CMeshIndex* NamedMeshIndex();
 
     // The open boundaries of the mesh, registered as "BoundaryNames".
     CBoundaryNamesKiv* BoundaryNames() const { return m_boundaries; }
@@ -78,8 +84,19 @@ private:
     int m_layers2 = 0;
     CString m_projection;
     CBoundaryNamesKiv* m_boundaries = nullptr;
+    struct FileStamp {
+        long long size = -1, time = 0;
+        bool operator==(const FileStamp&) const = default;
+    };
+    static FileStamp StampOf(const std::string& path);
+    bool CheckBoundaries(const CMesh& mesh);
+
     MeshPtr m_mesh;
     std::string m_meshPath;   // where m_mesh was read from
+    FileStamp m_meshStamp;    // of m_meshPath when it was read
+    std::string m_meshError;  // why m_meshPath could not be read
+    MeshPtr m_indexed;        // the mesh m_index was built for
+    std::unique_ptr<CMeshIndex> m_index;
 };
 
 CDomainKiv* Domain(const CZoSEKivBase* node);

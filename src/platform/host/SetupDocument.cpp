@@ -1,6 +1,7 @@
 #include "SetupDocument.h"
 
 #include "ModuleSelection.h"
+#include "common/FileNames.h"
 #include "core/MudTransportModuleKiv.h"
 #include "fem/BoundaryNamesKiv.h"
 #include "fem/DomainKiv.h"
@@ -30,14 +31,25 @@ CSetupDocument::CSetupDocument() {
 
 CSetupDocument::~CSetupDocument() = default;
 
-CString CSetupDocument::DocumentFolder() const {
-    if (m_fileName.empty())
-        return {};
+namespace {
+std::string FolderOf(const std::string& fileName) {
     std::error_code ec;
-    const std::filesystem::path full = std::filesystem::absolute(m_fileName, ec);
+    const std::filesystem::path full = std::filesystem::absolute(fileName, ec);
     if (ec)
         return {};
     return full.lexically_normal().parent_path().string();
+}
+}  // namespace
+
+CString CSetupDocument::DocumentFolder() const {
+    return m_fileName.empty() ? CString() : FolderOf(m_fileName);
+}
+
+std::string CSetupDocument::NamesFolder() const {
+    if (!m_fileName.empty())
+        return DocumentFolder();
+    std::error_code ec;
+    return std::filesystem::current_path(ec).lexically_normal().string();
 }
 
 int CSetupDocument::DecoupledSimulation() const {
@@ -74,6 +86,7 @@ CSetupDocument::OpenResult CSetupDocument::FromParsed(paramfile::ParseResult par
     }
     auto doc = std::make_unique<CSetupDocument>();
     doc->m_fileName = fileName;
+    doc->m_identity = parsed.identity;
     void* top = const_cast<paramfile::Section*>(&parsed.document->Root());
     POSITION pos = 0;
     for (CZoSEKivBase* c = doc->GetFirstChild(pos); c; c = doc->GetNextChild(pos))
@@ -198,10 +211,17 @@ void CSetupDocument::CheckWhatWasRead(std::vector<paramfile::Diagnostic>& warnin
                      });
 }
 
-std::string CSetupDocument::ToText() {
+std::string CSetupDocument::ToText() { return ToText({}, {}); }
+
+std::string CSetupDocument::ToText(const std::string& fromFolder, const std::string& toFolder) {
     paramfile::Document out;
     paramfile::Builder builder(out);
     void* h = &builder;
+    // Sections of other modules are copied through the builder too, so their names follow.
+    if (!fromFolder.empty() && !toFolder.empty() && fromFolder != toFolder)
+        builder.MapFileNames([&](std::string_view name) {
+            return RebasedFileName(name, fromFolder, toFolder);
+        });
 
     std::set<CString> written;
     // Sections keep the places they had in the file; new ones follow in the host's order.
@@ -226,12 +246,36 @@ std::string CSetupDocument::ToText() {
     return paramfile::WriteText(out);
 }
 
-bool CSetupDocument::SaveAs(const std::string& path, std::string* error) {
-    const std::string text = ToText();
-    if (!paramfile::WriteFileAtomic(path, text, error))
+bool CSetupDocument::SaveAs(const std::string& path, std::string* error, bool* changed,
+                            bool overwrite) {
+    const std::string from = NamesFolder(), to = FolderOf(path);
+    const bool moved = !from.empty() && !to.empty() && from != to;
+    const std::string text = moved ? ToText(from, to) : ToText();
+    auto normal = [](const std::string& p) {
+        std::error_code ec;
+        const std::filesystem::path a = std::filesystem::absolute(p, ec);
+        return (ec ? std::filesystem::path(p) : a).lexically_normal();
+    };
+    const bool sameFile = !m_fileName.empty() && normal(path) == normal(m_fileName);
+    const fileio::FileIdentity* expected = sameFile && !overwrite ? &m_identity : nullptr;
+    fileio::FileIdentity written;
+    if (!fileio::WriteFileAtomic(path, text, error, expected, changed, &written))
         return false;
+    m_identity = written;
     m_fileName = path;
     m_dropped.clear();
+    if (moved) {
+        // The nodes and the kept sections take the names as written: the setup is now the
+        // file, and saving it again changes nothing.
+        paramfile::ParseResult parsed = paramfile::ParseText(text, m_fileName);
+        if (parsed.document) {
+            void* top = const_cast<paramfile::Section*>(&parsed.document->Root());
+            POSITION pos = 0;
+            for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))
+                c->Load(top);
+            m_source = std::move(parsed.document);
+        }
+    }
     return true;
 }
 

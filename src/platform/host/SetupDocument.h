@@ -52,8 +52,13 @@ public:
     // down), valid while the tree keeps its shape; empty for a node outside this document.
     std::vector<int> PlaceOf(const CZoSEKivBase* node);
     CZoSEKivBase* NodeAt(const std::vector<int>& place);
-    // Atomic: on failure the file on disk and this document stay as they were.
-    bool SaveAs(const std::string& path, std::string* error);
+    // Atomic: on failure the file on disk and this document stay as they were. Saved into
+    // another folder, every relative file name is rewritten to name the same file from there
+    // (in the file and in the nodes, RebasedFileName). Saving to the file that was read
+    // writes nothing when another program saved it since (changed is then set), unless
+    // overwrite is true.
+    bool SaveAs(const std::string& path, std::string* error, bool* changed = nullptr,
+                bool overwrite = false);
 
     // What the file held that no node reads, so that saving drops it (one warning each, also
     // among the warnings of Open). Empty after the first successful save.
@@ -89,12 +94,18 @@ private:
         return node;
     }
     static OpenResult FromParsed(paramfile::ParseResult parsed, const std::string& fileName);
+    // The folder relative file names are taken from: the file's, or the current one for a
+    // setup not yet saved.
+    std::string NamesFolder() const;
+    std::string ToText(const std::string& fromFolder, const std::string& toFolder);
     CZoSEKivBase* OwnerOf(std::string_view sectionName);
     // Reports what loading passed over: content no node read, a module section that is
     // missing or repeated.
     void CheckWhatWasRead(std::vector<paramfile::Diagnostic>& warnings);
 
     std::string m_fileName;
+    // The file as read or last saved; unknown for a new setup.
+    fileio::FileIdentity m_identity;
     // What was read, for the top-level sections that are kept as they were.
     std::unique_ptr<paramfile::Document> m_source;
     std::vector<paramfile::Diagnostic> m_dropped;

@@ -1,6 +1,7 @@
 #include "HDSourcesKiv.h"
 
 #include "fem/DomainKiv.h"
+#include "mesh/MeshIndex.h"
 #include "setupeditor/KivFields.h"
 
 namespace {
@@ -36,6 +37,13 @@ void CHDSourceItemKiv::ReadData(void* h) { ReadFields(h, *this, HDSourceFields::
 int CHDSourceItemKiv::ValidateData() {
     if (m_name.empty()) {
         AddError("A source needs a name");
+        return 0;
+    }
+    // A mesh that cannot be read is the domain's message.
+    CDomainKiv* domain = Domain(this);
+    const CMeshIndex* index = m_include && domain ? domain->NamedMeshIndex() : nullptr;
+    if (index && index->ElementAt(m_x, m_y) < 0) {
+        AddError(FormatString("The source lies outside the mesh (x %.10g, y %.10g)", m_x, m_y));
         return 0;
     }
     return 1;

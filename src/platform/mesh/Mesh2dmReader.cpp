@@ -11,13 +11,13 @@
 // MESHNAME and NUM_MATERIALS_PER_ELEM are passed over; other cards (MAT, BEGPARAMDEF ...
 // ENDPARAMDEF, ...) with a note.
 #include "MeshReader.h"
+#include "fileio/GuardedFile.h"
 
 #include <algorithm>
 #include <charconv>
 #include <climits>
 #include <cmath>
 #include <cstdint>
-#include <fstream>
 #include <optional>
 #include <set>
 #include <sstream>
@@ -459,21 +459,18 @@ MeshReadResult ReadMeshFile(const std::string& path) {
     const std::string ext = dot == std::string::npos ? std::string() : path.substr(dot);
     if (ext == ".nc" || ext == ".nc4" || ext == ".cdf")
         return ReadUgrid(path);
-    std::ifstream in(path, std::ios::binary);
-    if (!in)
-        return {nullptr, path + ": cannot be opened"};
+    // Sniffed without reading: a netCDF file may be far larger than a text mesh.
+    fileio::InFile in;
+    if (const auto failure = in.Open(path, fileio::kNetcdfFiles))
+        return {nullptr, path + ": " + failure->Text()};
     char magic[4] = {};
-    in.read(magic, 4);
-    if (in.gcount() == 4 &&
+    if (in.Size() >= 4 && in.ReadAt(0, magic, 4) &&
         ((magic[0] == 'C' && magic[1] == 'D' && magic[2] == 'F') ||
          (magic[0] == '\x89' && magic[1] == 'H' && magic[2] == 'D' && magic[3] == 'F')))
         return ReadUgrid(path);
-    in.clear();
-    in.seekg(0);
-    std::ostringstream buffer;
-    buffer << in.rdbuf();
-    if (in.bad())
-        return {nullptr, path + ": cannot be read"};
-    const std::string text = std::move(buffer).str();
+    in.Close();
+    std::string text;
+    if (const auto failure = fileio::ReadWholeFile(path, fileio::kMeshFiles, text))
+        return {nullptr, path + ": " + failure->Text()};
     return Read2dm(text, path);
 }

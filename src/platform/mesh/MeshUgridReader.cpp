@@ -9,6 +9,7 @@
 // on any variable of the mesh, or from geographical coordinates.
 #include "MeshReader.h"
 #include "projection/ZoMapProjection.h"
+#include "fileio/NetcdfHeader.h"
 
 #include <netcdf.h>
 
@@ -35,7 +36,8 @@ struct Fail {
 
 class File {
 public:
-    explicit File(const std::string& path) : m_path(path) {
+    // maxCount: the most nodes, elements or rows the file can hold (see MaxCountOf).
+    File(const std::string& path, size_t maxCount) : m_path(path), m_maxCount(maxCount) {
         m_status = nc_open(path.c_str(), NC_NOWRITE, &m_id);
     }
     ~File() {
@@ -43,6 +45,7 @@ public:
             nc_close(m_id);
     }
     int Status() const { return m_status; }
+    size_t MaxCount() const { return m_maxCount; }
     int Id() const { return m_id; }
 
     std::string TextAtt(int var, const char* name) const {
@@ -128,6 +131,7 @@ public:
 
 private:
     std::string m_path;
+    size_t m_maxCount = 0;
     int m_id = -1;
     int m_status = NC_NOERR;
 };
@@ -273,7 +277,7 @@ std::vector<int> Connectivity(const File& f, int var, size_t nodes, size_t colum
     if (columns != 2 && width > kMaxFaceColumns)
         throw Fail{what + ": faces of up to " + std::to_string(width) +
                    " nodes: the flow model takes triangles and quadrilaterals"};
-    if (rows > kMaxCount || rows * width > 4 * kMaxCount)
+    if (rows > f.MaxCount() || rows * width > 4 * f.MaxCount())
         throw Fail{what + ": more rows than can be read (" + std::to_string(rows) + ")"};
     // Read as doubles: any integer type, and floating tables with NaN as fill, alike.
     std::vector<double> raw(rows * width);
@@ -617,10 +621,23 @@ std::string Projection(const File& f, const Topology& topo, const std::string& x
     return {};
 }
 
+// Every value takes at least a byte of a classic file; compressed netCDF-4 data takes at
+// least a byte in 1032 (the best that deflate does).
+size_t MaxCountOf(const fileio::NetcdfCheck& check) {
+    const auto size = static_cast<unsigned long long>(check.size);
+    const unsigned long long most =
+        check.format == fileio::NetcdfFormat::Hdf5 ? size * 1032 : size;
+    return static_cast<size_t>(std::min<unsigned long long>(most, kMaxCount));
+}
+
 } // namespace
 
 MeshReadResult ReadUgrid(const std::string& path) {
-    File f(path);
+    // A header that claims more than the file holds would make the library allocate by it.
+    fileio::NetcdfCheck check;
+    if (const auto failure = fileio::PrecheckNetcdf(path, &check))
+        return {nullptr, path + ": " + failure->Text()};
+    File f(path, MaxCountOf(check));
     if (f.Status() != NC_NOERR)
         return {nullptr, path + ": " + nc_strerror(f.Status())};
     try {
@@ -633,7 +650,7 @@ MeshReadResult ReadUgrid(const std::string& path) {
         if (xShape.size() != 1 || xShape[0] == 0)
             throw Fail{"no nodes in " + xName};
         const size_t n = xShape[0];
-        if (n > kMaxCount)
+        if (n > f.MaxCount())
             throw Fail{"more nodes than can be read (" + std::to_string(n) + ")"};
         mesh->x = Coordinates(f, xVar, n, xName);
         mesh->y = Coordinates(f, yVar, n, yName);

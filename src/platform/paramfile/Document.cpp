@@ -602,6 +602,7 @@ struct Builder::State {
     const Document* commentSource = nullptr;
     std::vector<const Section*> sourceOpen;
     int copying = 0;
+    std::function<std::string(std::string_view)> mapFileName;
 };
 
 Builder::Builder(Document& doc) : doc_(doc), state_(std::make_unique<State>()) {
@@ -792,8 +793,17 @@ void Builder::AddString(std::string_view v) {
 void Builder::AddFileName(std::string_view v) {
     if (state_->keyword < 0)
         return;
+    std::string mapped;
+    if (state_->mapFileName) {
+        mapped = state_->mapFileName(v);
+        v = mapped;
+    }
     Document::Impl& d = doc_.impl();
     AddParam(d, state_->keyword, Access::Text(ParamType::FileName, d.text.Store(v), v.size()));
+}
+
+void Builder::MapFileNames(std::function<std::string(std::string_view)> map) {
+    state_->mapFileName = std::move(map);
 }
 
 void Builder::CopySection(const Section& section) {

@@ -11,7 +11,10 @@
 // Every value written reads back unchanged: same type, same bits, same text.
 #pragma once
 
+#include "fileio/GuardedFile.h"
+
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -154,6 +157,7 @@ struct ParseResult {
     std::optional<Diagnostic> error;
     // The error came before the first section opened: the text is not a parameter file.
     bool beforeFirstSection = false;
+    fileio::FileIdentity identity;  // of the file read, to tell whether it changed since
 };
 
 // Every entry below section that no look-up found, one message each at its place ("unknown
@@ -165,21 +169,13 @@ std::vector<Diagnostic> UnreadEntries(const Section& section, const std::string&
 ParseResult ParseText(std::string text, std::string fileName);
 // As ParseText; a file that cannot be read, or is not a regular file of at most
 // kMaxFileBytes, gives an error at line 0, column 0 (nothing is read from it).
-inline constexpr long long kMaxFileBytes = 0x7FFFFFFE;
+inline constexpr long long kMaxFileBytes = fileio::kSetupFiles.maxBytes;
 ParseResult ParseFile(const std::string& path);
 
 // The canonical text: four spaces a level, "keyword = v1, v2", reals in shortest form;
 // comments on lines of their own before their entry, or after it on its line.
 std::string WriteText(const Document& doc);
 void WriteText(const Document& doc, std::string& out);
-
-// Writes beside the target and renames over it only when everything was written and
-// flushed; on failure the target is untouched and error says why. A symbolic link is
-// followed (the file it names is replaced); anything but a regular file or a new name is
-// refused. The text goes to an unnamed file first where the file system allows it, so that
-// a process killed while writing leaves nothing behind; temporaries of saves that died
-// are removed.
-bool WriteFileAtomic(const std::string& path, std::string_view text, std::string* error);
 
 // Builds a document in order: sections opened and closed, keywords with their parameters.
 class Builder {
@@ -198,6 +194,9 @@ public:
     void AddBool(bool v);
     void AddString(std::string_view v);
     void AddFileName(std::string_view v);
+    // File names added from now on, copied ones too, are stored as map gives them (a setup
+    // saved into another folder names the same files from there).
+    void MapFileNames(std::function<std::string(std::string_view)> map);
     // Deep copy of a section of another (or this) document into the current section, with
     // its comments.
     void CopySection(const Section& section);

@@ -1,17 +1,12 @@
 #include "paramfile/ParamFileImpl.h"
 
 #include <array>
-#include <cerrno>
 #include <charconv>
 #include <climits>
 #include <cmath>
 #include <cstdio>
 #include <cstring>
 #include <limits>
-
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
 
 #if defined(__SSE2__)
 #include <emmintrin.h>
@@ -676,52 +671,16 @@ ParseResult ParseText(std::string text, std::string fileName) {
 }
 
 ParseResult ParseFile(const std::string& path) {
-    auto refuse = [&](const std::string& why) {
-        ParseResult r;
-        r.error = Diagnostic{path, {0, 0}, "cannot read '" + path + "': " + why};
-        return r;
-    };
-    auto fail = [&](int err) { return refuse(std::strerror(err)); };
-    // Not blocking: opening a FIFO would otherwise wait for a writer.
-    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
-    if (fd < 0)
-        return fail(errno);
-    struct stat st {};
-    if (::fstat(fd, &st) != 0) {
-        const int err = errno;
-        ::close(fd);
-        return fail(err);
-    }
-    if (!S_ISREG(st.st_mode)) {
-        ::close(fd);
-        return S_ISDIR(st.st_mode) ? fail(EISDIR) : refuse("not a regular file");
-    }
-    if (st.st_size > kMaxFileBytes) {
-        ::close(fd);
-        return refuse("larger than " + std::to_string(kMaxFileBytes) + " bytes");
-    }
     std::string text;
-    text.reserve(static_cast<std::size_t>(st.st_size));
-    char buf[65536];
-    for (;;) {
-        const ssize_t n = ::read(fd, buf, sizeof buf);
-        if (n < 0 && (errno == EINTR || errno == EAGAIN))
-            continue;
-        if (n < 0) {
-            const int err = errno;
-            ::close(fd);
-            return fail(err);
-        }
-        if (n == 0)
-            break;
-        text.append(buf, static_cast<std::size_t>(n));
-        if (text.size() > static_cast<std::size_t>(kMaxFileBytes)) {
-            ::close(fd);
-            return refuse("larger than " + std::to_string(kMaxFileBytes) + " bytes");
-        }
+    fileio::FileIdentity identity;
+    if (auto failure = fileio::ReadWholeFile(path, fileio::kSetupFiles, text, &identity)) {
+        ParseResult r;
+        r.error = Diagnostic{path, {0, 0}, "cannot read '" + path + "': " + failure->SystemText()};
+        return r;
     }
-    ::close(fd);
-    return ParseText(std::move(text), path);
+    ParseResult r = ParseText(std::move(text), path);
+    r.identity = identity;
+    return r;
 }
 
 } // namespace paramfile

@@ -1,6 +1,8 @@
 #include "BoundaryConditionsComponentItemDlg.h"
 
+#include "FemBase.h"
 #include "FemInDataDlg.h"
+#include "ZoFileSelectorDlg.h"
 #include "ZoNumberEdit.h"
 #include "ZoPrompts.h"
 #include "fem/BoundaryConditionsComponentItemKiv.h"
@@ -8,9 +10,11 @@
 #include <QComboBox>
 #include <QGridLayout>
 #include <QGroupBox>
+#include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPointer>
+#include <QPushButton>
 #include <QSignalBlocker>
 #include <QToolButton>
 #include <QVBoxLayout>
@@ -30,6 +34,12 @@ void ShowIndex(QComboBox* box, int index) {
     box->setCurrentIndex(index >= 0 && index < box->count() ? index : -1);
 }
 
+// Values in time come from time series, values along the boundary from line series.
+const char* FilterFor(int format) {
+    return format == 1 ? "Time series files (*.qrd0)|*.qrd0;*.kx0|All files (*.*)|*.*||"
+                       : "Line series files (*.qrd1)|*.qrd1|All files (*.*)|*.*||";
+}
+
 QComboBox* Choice(const char* name, QWidget* parent) {
     auto* box = new QComboBox(parent);
     box->setObjectName(name);
@@ -41,7 +51,8 @@ CBoundaryConditionsComponentItemDlg::CBoundaryConditionsComponentItemDlg(QWidget
     : CZoSEDlgBase(parent), m_type(Choice("type", this)), m_format(Choice("format", this)),
       m_constant(new CZoNumberEdit(this)), m_constantUnit(new QLabel(this)),
       m_fileName(new QLineEdit(this)), m_browse(new QToolButton(this)),
-      m_items(new QLineEdit(this)), m_softTime(new CZoNumberEdit(this)),
+      m_items(new QLineEdit(this)), m_select(new QPushButton("Select ...", this)),
+      m_view(new QPushButton("View ...", this)), m_softTime(new CZoNumberEdit(this)),
       m_softTimeUnit(new QLabel(this)), m_refSoft(new CZoNumberEdit(this)),
       m_refSoftUnit(new QLabel(this)),
       m_typeSoft(Choice("softStartType", this)), m_typeTI(Choice("timeInterpolation", this)),
@@ -53,6 +64,10 @@ CBoundaryConditionsComponentItemDlg::CBoundaryConditionsComponentItemDlg(QWidget
     m_browse->setToolTip("Select the data file");
     m_items->setObjectName("itemNumbers");
     m_items->setToolTip("Item numbers of the data file, separated by commas");
+    m_select->setObjectName("select");
+    m_select->setToolTip("Choose the data file and its item with the file selector");
+    m_view->setObjectName("view");
+    m_view->setToolTip("Show the values of the data file");
     m_softTime->setObjectName("softStartTime");
     m_refSoft->setObjectName("softStartReference");
 
@@ -76,10 +91,15 @@ CBoundaryConditionsComponentItemDlg::CBoundaryConditionsComponentItemDlg(QWidget
     v->addWidget(m_browse, 2, 2);
     v->addWidget(new QLabel("Item numbers", value), 3, 0);
     v->addWidget(m_items, 3, 1);
-    v->addWidget(new QLabel("Interpolation in time", value), 4, 0);
-    v->addWidget(m_typeTI, 4, 1, 1, 2);
-    v->addWidget(new QLabel("Interpolation along the boundary", value), 5, 0);
-    v->addWidget(m_typeSI, 5, 1, 1, 2);
+    auto* fileButtons = new QHBoxLayout;
+    fileButtons->addWidget(m_select);
+    fileButtons->addWidget(m_view);
+    fileButtons->addStretch(1);
+    v->addLayout(fileButtons, 4, 1, 1, 2);
+    v->addWidget(new QLabel("Interpolation in time", value), 5, 0);
+    v->addWidget(m_typeTI, 5, 1, 1, 2);
+    v->addWidget(new QLabel("Interpolation along the boundary", value), 6, 0);
+    v->addWidget(m_typeSI, 6, 1, 1, 2);
     v->setColumnStretch(1, 1);
     layout->addWidget(value);
 
@@ -126,6 +146,8 @@ CBoundaryConditionsComponentItemDlg::CBoundaryConditionsComponentItemDlg(QWidget
     connect(m_browse, &QToolButton::clicked, this, &CBoundaryConditionsComponentItemDlg::OnBrowse);
     connect(m_items, &QLineEdit::editingFinished, this,
             &CBoundaryConditionsComponentItemDlg::OnItemNumbersEdited);
+    connect(m_select, &QPushButton::clicked, this, &CBoundaryConditionsComponentItemDlg::OnSelect);
+    connect(m_view, &QPushButton::clicked, this, &CBoundaryConditionsComponentItemDlg::OnView);
 }
 
 CBoundaryConditionsComponentItemKiv* CBoundaryConditionsComponentItemDlg::BoundaryItem() const {
@@ -185,6 +207,12 @@ void CBoundaryConditionsComponentItemDlg::SetData() {
     m_fileName->setEnabled(format != 0);
     m_browse->setEnabled(format != 0);
     m_items->setEnabled(format != 0);
+    m_select->setEnabled(format != 0);
+    // Only a file that reads can be shown.
+    bool readable = false;
+    if (specified && format != 0 && !item->QrdData()->FileName().empty())
+        readable = CZoFileSelector(item).Header(item->QrdData()->FileName())->header.has_value();
+    m_view->setEnabled(readable);
     m_typeTI->setEnabled(format > 0 && (format & 1));
     m_typeSI->setEnabled(format > 0 && (format & 2));
     const bool soft = item->TypeSoft() != 0;
@@ -237,4 +265,35 @@ void CBoundaryConditionsComponentItemDlg::OnItemNumbersEdited() {
     }
     item->QrdData()->ItemNumbers(std::move(items));
     Changed();
+}
+
+void CBoundaryConditionsComponentItemDlg::OnSelect() {
+    BcItem* item = BoundaryItem();
+    if (!item)
+        return;
+    CFemInDataFile* file = item->QrdData();
+    const int format = item->Format();
+    CZoFileSelectorDlg dialog(file->FileName(), FilterFor(format), format == 1 ? "qrd0" : "qrd1", this);
+    dialog.SetBaseFolder(CZoFileSelector(item).BaseFolder());
+    dialog.AddRequest(item->GetTitle().empty() ? CString("Boundary value") : item->GetTitle())
+        .SetOvuType(item->OvuType());
+    dialog.SetMinNoItems(1);
+    dialog.SetAcceptedKinds({format == 1 ? datafile::Kind::TimeSeries : datafile::Kind::LineSeries});
+    dialog.SetSelectedItems(file->ItemNumbers());
+    QPointer<CBoundaryConditionsComponentItemDlg> self(this);
+    if (ZoRunFileSelector(dialog) != QDialog::Accepted || !self)
+        return;
+    file->FileName(dialog.FileName());
+    file->ItemNumbers(dialog.SelectedItems());
+    file->ItemName(dialog.SelectedItems().empty() ? CString()
+                                                  : dialog.GetNameOfItem(dialog.SelectedItems().front()));
+    Changed();
+}
+
+void CBoundaryConditionsComponentItemDlg::OnView() {
+    const BcItem* item = BoundaryItem();
+    if (!item)
+        return;
+    const CFemInDataFile* file = item->QrdData();
+    CFemBase::OpenDataFile(CZoFileSelector(item).AbsolutePath(file->FileName()), file->ItemNumbers(), this);
 }

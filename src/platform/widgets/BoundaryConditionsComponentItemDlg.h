@@ -9,6 +9,7 @@ class CZoNumberEdit;
 class QComboBox;
 class QLabel;
 class QLineEdit;
+class QPushButton;
 class QToolButton;
 
 class CBoundaryConditionsComponentItemDlg : public CZoSEDlgBase {
@@ -24,6 +25,8 @@ public:
     QLineEdit* FileNameEdit() const { return m_fileName; }
     QToolButton* BrowseButton() const { return m_browse; }
     QLineEdit* ItemNumbersEdit() const { return m_items; }
+    QPushButton* SelectButton() const { return m_select; }
+    QPushButton* ViewButton() const { return m_view; }
     CZoNumberEdit* SoftTimeEdit() const { return m_softTime; }
     CZoNumberEdit* SoftReferenceEdit() const { return m_refSoft; }
     QComboBox* SoftTypeBox() const { return m_typeSoft; }
@@ -36,6 +39,8 @@ private:
     void OnFileNameEdited();
     void OnBrowse();
     void OnItemNumbersEdited();
+    void OnSelect();
+    void OnView();
 
     QComboBox* m_type;
     QComboBox* m_format;
@@ -44,6 +49,8 @@ private:
     QLineEdit* m_fileName;
     QToolButton* m_browse;
     QLineEdit* m_items;
+    QPushButton* m_select;
+    QPushButton* m_view;
     CZoNumberEdit* m_softTime;
     QLabel* m_softTimeUnit;
     CZoNumberEdit* m_refSoft;

@@ -34,6 +34,7 @@ CFemPropertySheetDlg::CFemPropertySheetDlg(QWidget* parent)
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(m_tabs);
+    connect(m_tabs, &QTabWidget::currentChanged, this, &CZoSEDlgBase::helpTopicChanged);
 }
 
 CFemPropertySheetDlg::~CFemPropertySheetDlg() = default;
@@ -82,10 +83,8 @@ void CFemPropertySheetDlg::SetData() {
         GetPage(i)->SetData();
 }
 
-void CFemPropertySheetDlg::ShowHelp() {
-    CZoSEDlgBase* page = GetPage(GetActiveIndex());
-    if (page && page->GetHelpID() != 0)
-        page->ShowHelp();
-    else
-        CZoSEDlgBase::ShowHelp();
+unsigned long CFemPropertySheetDlg::CurrentHelpID() const {
+    const CZoSEDlgBase* page = GetPage(GetActiveIndex());
+    const unsigned long id = page ? page->CurrentHelpID() : 0;
+    return id != 0 ? id : GetHelpID();
 }

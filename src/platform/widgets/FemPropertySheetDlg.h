@@ -33,7 +33,7 @@ public:
     void Initialize() override;
     void SetData() override;
     // The help of the page shown, or the sheet's own when the page has none.
-    void ShowHelp() override;
+    unsigned long CurrentHelpID() const override;
 
 private:
     class PageHost;

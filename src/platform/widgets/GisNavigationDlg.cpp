@@ -115,16 +115,27 @@ int CGisNavigationDlg::AddSourceOverlay() {
 }
 
 int CGisNavigationDlg::AddFeatureMenu(QMenu& menu, const std::vector<CZoMapHit>& hits,
-                                      const QString& title) {
+                                      const QString& title, const SubItemNames& subItems) {
     if (hits.empty())
         return 0;
     QMenu* sub = menu.addMenu(title);
+    int entries = 0;
     for (const CZoMapHit& hit : hits) {
         const CZoMapFeature& f = m_map->Feature(hit);
-        QAction* a = sub->addAction(f.name.isEmpty() ? tr("Feature %1").arg(f.number) : f.name);
+        const QString name = f.name.isEmpty() ? tr("Feature %1").arg(f.number) : f.name;
+        QAction* a = sub->addAction(name);
         a->setData((f.number << 16) | (f.subIndex & 0xffff));
+        ++entries;
+        if (!subItems)
+            continue;
+        const std::vector<QString> names = subItems(f.number);
+        for (size_t i = 0; i < names.size() && i < 0xffff; ++i) {
+            QAction* s = sub->addAction(QStringLiteral("%1: %2").arg(name, names[i]));
+            s->setData((f.number << 16) | static_cast<int>(i + 1));
+            ++entries;
+        }
     }
-    return static_cast<int>(hits.size());
+    return entries;
 }
 
 void CGisNavigationDlg::BuildDefaultMenu(QMenu& menu) {

@@ -7,6 +7,9 @@
 #include "ZoMapView.h"
 #include "ZoSEDlgBase.h"
 
+#include <functional>
+#include <vector>
+
 class QLabel;
 class QMenu;
 
@@ -31,8 +34,12 @@ public:
     int AddSourceOverlay();
 
     // A sub-menu "title" with one entry per feature hit; each entry's data holds the
-    // feature's number (high word) and sub-index (low word). Returns the number of entries.
-    int AddFeatureMenu(QMenu& menu, const std::vector<CZoMapHit>& hits, const QString& title);
+    // feature's number (high word) and sub-index (low word). With subItems, each feature's
+    // entry is followed by one per sub-item (the names it gives for the feature's number),
+    // with the sub-indexes 1 to n. Returns the number of entries.
+    using SubItemNames = std::function<std::vector<QString>(int number)>;
+    int AddFeatureMenu(QMenu& menu, const std::vector<CZoMapHit>& hits, const QString& title,
+                       const SubItemNames& subItems = {});
     // The features under a pixel of the map.
     std::vector<CZoMapHit> HitTest(QPointF pixel) const { return m_map->HitTest(pixel); }
 

@@ -26,15 +26,12 @@ void CHDSourceGisPropSheet::Initialize() {
     });
 }
 
-void CHDSourceGisPropSheet::ShowHelp() {
+unsigned long CHDSourceGisPropSheet::CurrentHelpID() const {
     const auto* help = dynamic_cast<const CFemHelpListBase*>(GetSection());
     const CZoSEDlgBase* page = GetPage(GetActiveIndex());
     const bool list = page && std::string(page->metaObject()->className()) == "CSourceDlg";
     const unsigned long id = help ? help->GetHelpID(list ? 1 : 0) : 0;
-    if (id != 0 && Host())
-        Host()->ShowHelp(id);
-    else
-        CFemPropertySheetDlg::ShowHelp();
+    return id != 0 ? id : CFemPropertySheetDlg::CurrentHelpID();
 }
 
 void CHDSourceGisPropSheet::SetInitialSelectedPage(int page) { s_page = page; }

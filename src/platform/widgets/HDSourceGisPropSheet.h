@@ -12,7 +12,7 @@ public:
 
     void Initialize() override;
     // The page's help: the node's help for the map (index 0) or for the list (index 1).
-    void ShowHelp() override;
+    unsigned long CurrentHelpID() const override;
 
     // The page and the source (1-based, 0 none) the next sheet opens with.
     static void SetInitialSelectedPage(int page);

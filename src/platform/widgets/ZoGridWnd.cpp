@@ -15,6 +15,7 @@
 #include <QMouseEvent>
 #include <QPainter>
 #include <QScrollBar>
+#include <QStyleOption>
 #include <QStyledItemDelegate>
 
 #include <algorithm>
@@ -498,9 +499,58 @@ private:
 
 }  // namespace
 
+// --- the row headings: title rows drawn across the whole row ------------------------------
+
+class CZoGridRowHeader : public QHeaderView {
+public:
+    explicit CZoGridRowHeader(CZoGridWnd* grid) : QHeaderView(Qt::Vertical, grid), m_grid(grid) {
+        // As the table's own: a click on a heading selects its row.
+        setSectionsClickable(true);
+        setHighlightSections(true);
+    }
+
+protected:
+    void paintSection(QPainter* painter, const QRect& rect, int logicalIndex) const override {
+        if (!m_grid->IsTitleRow(logicalIndex + 1)) {
+            QHeaderView::paintSection(painter, rect, logicalIndex);
+            return;
+        }
+        const QRect row(-m_grid->horizontalHeader()->offset(), rect.top(),
+                        width() + m_grid->horizontalHeader()->length(), rect.height());
+        m_grid->PaintTitleRow(*painter, viewport(), logicalIndex + 1, row);
+    }
+
+private:
+    CZoGridWnd* m_grid;
+};
+
+namespace {
+
+// The width and height a heading needs in a header, as the header measures its sections.
+QSize HeadingSize(const QHeaderView* header, const QString& text, const QFont& font) {
+    QStyleOptionHeader opt;
+    opt.initFrom(header);
+    opt.orientation = Qt::Horizontal;
+    opt.text = text;
+    opt.fontMetrics = QFontMetrics(font);
+    opt.position = QStyleOptionHeader::OnlyOneSection;
+    // A little beyond the style's margins for the section's frame lines.
+    return header->style()->sizeFromContents(QStyle::CT_HeaderSection, &opt, QSize(), header) +
+           QSize(6, 0);
+}
+
+QFont TitleFont(const QFont& font) {
+    QFont bold = font;
+    bold.setBold(true);
+    return bold;
+}
+
+}  // namespace
+
 // --- the grid --------------------------------------------------------------------------
 
 CZoGridWnd::CZoGridWnd(QWidget* parent) : QTableView(parent), m_model(new CZoGridModel(this)) {
+    setVerticalHeader(new CZoGridRowHeader(this));
     setModel(m_model);
     setItemDelegate(new CZoGridDelegate(this));
     setSelectionMode(QAbstractItemView::ExtendedSelection);
@@ -548,6 +598,7 @@ int CZoGridWnd::GetRowCount() const { return m_model->rowCount({}); }
 
 void CZoGridWnd::Redraw() {
     m_model->Sync(RowCountFromData(), m_colCount);
+    FitToContents();
     viewport()->update();
     horizontalHeader()->viewport()->update();
     verticalHeader()->viewport()->update();
@@ -555,9 +606,140 @@ void CZoGridWnd::Redraw() {
         m_corner->update();
 }
 
+bool CZoGridWnd::IsTitleRow(int) const { return false; }
+
+void CZoGridWnd::SetMinimumColumnWidth(int col, int width) {
+    if (col < 0)
+        return;
+    if (static_cast<size_t>(col) >= m_minWidths.size())
+        m_minWidths.resize(static_cast<size_t>(col) + 1, 0);
+    m_minWidths[static_cast<size_t>(col)] = width;
+}
+
+std::vector<int> CZoGridWnd::SampleRows() const {
+    constexpr int kEdge = 100;     // rows measured at either end
+    constexpr int kBetween = 100;  // rows measured between them, evenly spread
+    const int rows = GetRowCount();
+    std::vector<int> sample;
+    if (rows <= 2 * kEdge + kBetween) {
+        for (int r = 1; r <= rows; ++r)
+            sample.push_back(r);
+        return sample;
+    }
+    for (int r = 1; r <= kEdge; ++r)
+        sample.push_back(r);
+    const double step = double(rows - 2 * kEdge) / (kBetween + 1);
+    for (int i = 1; i <= kBetween; ++i)
+        sample.push_back(kEdge + static_cast<int>(i * step));
+    for (int r = rows - kEdge + 1; r <= rows; ++r)
+        sample.push_back(r);
+    return sample;
+}
+
 void CZoGridWnd::FitColumns() {
-    resizeColumnsToContents();
-    resizeRowsToContents();
+    const int cols = m_model->columnCount({});
+    const std::vector<int> sample = SampleRows();
+    auto minimum = [&](int col) {
+        return static_cast<size_t>(col) < m_minWidths.size() ? m_minWidths[static_cast<size_t>(col)] : 0;
+    };
+    QHeaderView* rowHeader = verticalHeader();
+    QHeaderView* colHeader = horizontalHeader();
+    const QFont rowFont = rowHeader->font();
+
+    // Cells: each column as wide as its widest text, every row as high as the tallest cell.
+    // The item view draws its text inside margins of its own beyond the size it asks for.
+    constexpr int kTextSlack = 8;
+    int height = std::max(HeadingSize(rowHeader, QStringLiteral("Xg"), rowFont).height(),
+                          fontMetrics().height() + 8);
+    int cellsWidth = 0;
+    for (int c = 1; c <= cols; ++c) {
+        int width = colHeader->sectionSizeHint(c - 1);
+        for (int r : sample) {
+            if (IsTitleRow(r))
+                continue;
+            const QSize hint = sizeHintForIndex(IndexOf(r, c));
+            width = std::max(width, hint.width() + kTextSlack);
+            height = std::max(height, hint.height());
+        }
+        width = std::max(width, minimum(c));
+        if (columnWidth(c - 1) != width)
+            setColumnWidth(c - 1, width);
+        cellsWidth += width;
+    }
+
+    // Row headings with the heading of their column, drawn in the corner; a title spans the
+    // whole row, so only what the cells leave is asked of the headings' column.
+    int headings = HeadingSize(colHeader, CellStyle(0, 0).DisplayText(), colHeader->font()).width();
+    int titles = 0;
+    for (int r : sample) {
+        const QString text = CellStyle(r, 0).DisplayText();
+        if (IsTitleRow(r))
+            titles = std::max(titles, HeadingSize(rowHeader, text, TitleFont(rowFont)).width());
+        else
+            headings = std::max(headings, HeadingSize(rowHeader, text, rowFont).width());
+    }
+    headings = std::max({headings, titles - cellsWidth, minimum(0)});
+    if (rowHeader->minimumWidth() != headings || rowHeader->maximumWidth() != headings)
+        rowHeader->setFixedWidth(headings);
+    if (rowHeader->defaultSectionSize() != height || rowHeader->length() != height * GetRowCount())
+        rowHeader->setDefaultSectionSize(height);
+}
+
+void CZoGridWnd::FitToContents() {
+    FitColumns();
+    SizeToDialog();
+}
+
+QSize CZoGridWnd::ContentSize() const {
+    // As the table lays out its headers.
+    const QHeaderView* rows = verticalHeader();
+    const QHeaderView* cols = horizontalHeader();
+    const int headingsWidth =
+        rows->isHidden() ? 0
+                         : std::min(std::max(rows->minimumWidth(), rows->sizeHint().width()), rows->maximumWidth());
+    const int headingsHeight =
+        cols->isHidden() ? 0
+                         : std::min(std::max(cols->minimumHeight(), cols->sizeHint().height()), cols->maximumHeight());
+    return {headingsWidth + cols->length(), headingsHeight + rows->length()};
+}
+
+void CZoGridWnd::PaintTitleRow(QPainter& painter, QWidget* on, int row, const QRect& rowRect) {
+    painter.save();
+    painter.setClipRect(on->rect().intersected(rowRect));
+    painter.setFont(TitleFont(verticalHeader()->font()));
+    QStyleOptionHeader opt;
+    opt.initFrom(on);
+    opt.rect = rowRect;
+    opt.orientation = Qt::Horizontal;
+    opt.position = QStyleOptionHeader::OnlyOneSection;
+    opt.textAlignment = Qt::AlignCenter;
+    opt.state |= QStyle::State_Raised;
+    opt.text = CellStyle(row, 0).DisplayText();
+    style()->drawControl(QStyle::CE_Header, &opt, &painter, on);
+    painter.restore();
+}
+
+void CZoGridWnd::paintEvent(QPaintEvent* event) {
+    QTableView::paintEvent(event);
+    const int rows = GetRowCount();
+    if (rows == 0)
+        return;
+    // Only the rows in view: a long list costs no more than a short one.
+    int first = rowAt(0);
+    int last = rowAt(viewport()->height() - 1);
+    if (first < 0)
+        return;
+    if (last < 0)
+        last = rows - 1;
+    QPainter painter(viewport());
+    const int headings = verticalHeader()->width();
+    for (int r = first; r <= last; ++r) {
+        if (!IsTitleRow(r + 1))
+            continue;
+        const QRect row(-horizontalHeader()->offset() - headings, rowViewportPosition(r),
+                        headings + horizontalHeader()->length(), rowHeight(r));
+        PaintTitleRow(painter, viewport(), r + 1, row);
+    }
 }
 
 void CZoGridWnd::SizeToDialog() {
@@ -578,11 +760,7 @@ void CZoGridWnd::SizeToDialog() {
     const int frameSize = 2 * frameWidth();
     const QSize available(frame->width() - marginX - topLeft.x() - frameSize,
                           frame->height() - marginY - topLeft.y() - frameSize);
-    const int headerWidth = verticalHeader()->isHidden() ? 0 : verticalHeader()->sizeHint().width();
-    const int headerHeight =
-        horizontalHeader()->isHidden() ? 0 : horizontalHeader()->sizeHint().height();
-    const QSize content(headerWidth + horizontalHeader()->length(),
-                        headerHeight + verticalHeader()->length());
+    const QSize content = ContentSize();
     if (available.width() <= 0 || available.height() <= 0)
         m_fit = ZoGridFit{content, false, false};  // not laid out yet
     else
@@ -706,7 +884,8 @@ void CZoGridWnd::mousePressEvent(QMouseEvent* event) {
 }
 
 bool CZoGridWnd::eventFilter(QObject* watched, QEvent* event) {
-    if (watched == m_dialogWidget.data() && event->type() == QEvent::Resize && m_fitted) {
+    if (watched == m_dialogWidget.data() && m_fitted &&
+        (event->type() == QEvent::Resize || event->type() == QEvent::Show)) {
         SizeToDialog();
     } else if (event->type() == QEvent::Paint && m_corner && watched == m_corner) {
         auto* corner = static_cast<QAbstractButton*>(watched);

@@ -97,14 +97,26 @@ public:
     int GetRowCount() const;
     int GetColCount() const { return m_colCount; }
 
-    // Reads the counts again and redraws every cell.
+    // Reads the counts again and redraws every cell; the grid fits its contents again.
     void Redraw();
-    // Column widths to their contents.
+    // Columns as wide as their widest text and heading (the row headings' column and its
+    // heading in the corner included), rows as high as their tallest cell. Measured on a
+    // sample of rows (the first, the last and some between), so long lists stay cheap.
     void FitColumns();
+    // A column (0: the row headings) is never fitted narrower than this.
+    void SetMinimumColumnWidth(int col, int width);
     // Sizes the grid to its contents within the dialog (up to the dialog's layout margins),
     // with scroll bars where it does not fit; done again whenever the dialog is resized.
     void SizeToDialog();
+    // FitColumns, then SizeToDialog.
+    void FitToContents();
     const ZoGridFit& LastFit() const { return m_fit; }
+    // Width and height of the headings and cells (what the grid shows without scrolling).
+    QSize ContentSize() const;
+
+    // A title row is drawn as one cell across the whole row, row heading included, showing
+    // the row heading's text: a heading over the rows that follow it.
+    virtual bool IsTitleRow(int row) const;
 
     // The style query: what cell (row, col) shows. Headings included.
     virtual void GetStyleRowCol(int row, int col, CGridCellStyle& style);
@@ -139,10 +151,18 @@ protected:
     virtual int RowCountFromData() const { return m_rowCount; }
     void UpdateDoc(int hint);
     void mousePressEvent(QMouseEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
+    friend class CZoGridRowHeader;
+    // Draws the part of a title row that falls into the painter's widget; rowRect is the
+    // whole row (row heading and cells) in that widget's coordinates.
+    void PaintTitleRow(QPainter& painter, QWidget* on, int row, const QRect& rowRect);
+    std::vector<int> SampleRows() const;
+
     CZoGridModel* m_model;
+    std::vector<int> m_minWidths;  // by column, 0 the row headings
     QPointer<QAbstractButton> m_corner;
     // Watched as a plain widget: its events still come while it is being destroyed.
     CZoSEDlgBase* m_dialog = nullptr;

@@ -12,6 +12,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <numbers>
 
 namespace {
 // More elements than this in view are drawn in software into an image.
@@ -274,6 +275,8 @@ void CZoMapView::Render(QPainter& p) {
     DrawMesh(p);
     DrawOverlays(p);
     DrawLegend(p);
+    m_scaleRect = DrawScaleBar(p);
+    DrawLabels(p);
     if (!m_message.isEmpty()) {
         p.setPen(QColor(90, 90, 90));
         p.drawText(rect().adjusted(12, 12, -12, -12), Qt::AlignCenter | Qt::TextWordWrap,
@@ -362,6 +365,7 @@ void CZoMapView::DrawElements(QPainter& p, const QRectF& view) {
 }
 
 void CZoMapView::DrawLegend(QPainter& p) {
+    m_legendRect = QRect();
     if (!m_mesh || m_mesh->NodeCount() == 0)
         return;
     const MeshExtent& e = m_mesh->Extent();
@@ -376,6 +380,7 @@ void CZoMapView::DrawLegend(QPainter& p) {
                                 fm.horizontalAdvance(title), fm.horizontalAdvance(none)});
     const QRect box(width() - textW - barW - 28, height() - barH - noDataH - fm.height() - 26,
                     textW + barW + 20, barH + noDataH + fm.height() + 18);
+    m_legendRect = box;
     p.save();
     p.setPen(QColor(0, 0, 0, 60));
     p.setBrush(QColor(255, 255, 255, 210));
@@ -445,13 +450,107 @@ void CZoMapView::DrawOverlays(QPainter& p) {
                 break;
             }
             }
-            if (o.labels && !f.name.isEmpty()) {
-                const QPointF at = f.kind == CZoMapFeature::kPolyline ? px[px.size() / 2] : px[0];
-                p.setPen(QColor(20, 20, 20));
-                p.drawText(at + QPointF(o.pointSize / 2 + 4, -4), f.name);
-            }
         }
     }
+    p.restore();
+}
+
+namespace {
+// A length of 1, 2 or 5 times a power of ten, at most the given one.
+double NiceLength(double most) {
+    if (!(most > 0))
+        return 0;
+    const double power = std::pow(10.0, std::floor(std::log10(most)));
+    for (double step : {5.0, 2.0, 1.0})
+        if (step * power <= most)
+            return step * power;
+    return power;
+}
+}  // namespace
+
+QRect CZoMapView::DrawScaleBar(QPainter& p) {
+    m_scaleText.clear();
+    if (m_scale <= 0 || width() < 120)
+        return {};
+    // Metres per pixel; a degree of latitude is about 111.32 km, one of longitude less by
+    // the cosine of the latitude in the middle of the view.
+    double metres = m_scale;
+    if (CZoMapProjection::IsGeographical(m_projection))
+        metres *= 111320.0 * std::cos(std::clamp(m_centre.y(), -89.0, 89.0) * std::numbers::pi / 180.0);
+    const double length = NiceLength(metres * std::min(120, width() / 4));
+    if (length <= 0)
+        return {};
+    const int bar = static_cast<int>(std::lround(length / metres));
+    m_scaleText = length >= 1000 ? QStringLiteral("%1 km").arg(length / 1000) : QStringLiteral("%1 m").arg(length);
+    const QFontMetrics fm = p.fontMetrics();
+    const QRect box(10, height() - fm.height() - 26, std::max(bar, fm.horizontalAdvance(m_scaleText)) + 12,
+                    fm.height() + 16);
+    p.save();
+    p.setPen(QColor(0, 0, 0, 60));
+    p.setBrush(QColor(255, 255, 255, 210));
+    p.drawRect(box);
+    const int y = box.bottom() - 6;
+    p.setPen(QPen(Qt::black, 2));
+    p.drawLine(box.left() + 6, y, box.left() + 6 + bar, y);
+    p.drawLine(box.left() + 6, y - 4, box.left() + 6, y);
+    p.drawLine(box.left() + 6 + bar, y - 4, box.left() + 6 + bar, y);
+    p.drawText(box.left() + 6, box.top() + fm.ascent() + 2, m_scaleText);
+    p.restore();
+    return box;
+}
+
+// Labels go beside their feature where they collide with nothing drawn before them: the
+// highlighted features' first, then layer by layer; one that finds no free place is left
+// out, so crowded labels thin out instead of covering each other.
+void CZoMapView::DrawLabels(QPainter& p) {
+    m_labelRects.clear();
+    const QFontMetricsF fm(p.fontMetrics());
+    const QRectF area = QRectF(rect()).adjusted(2, 2, -2, -2);
+    std::vector<QRectF> blocked;
+    if (!m_legendRect.isNull())
+        blocked.push_back(m_legendRect);
+    if (!m_scaleRect.isNull())
+        blocked.push_back(m_scaleRect);
+    auto place = [&](const CZoMapOverlay& o, const CZoMapFeature& f) {
+        if (f.points.isEmpty())
+            return;
+        const QPointF w = f.kind == CZoMapFeature::kPolyline ? f.points[f.points.size() / 2] : f.points[0];
+        const QPointF at = ToPixel(w.x(), w.y());
+        if (!area.contains(at))
+            return;
+        const QSizeF size(fm.horizontalAdvance(f.name) + 4, fm.height());
+        const double gap = o.pointSize / 2 + 4;
+        const QPointF corners[] = {at + QPointF(gap, -size.height()),
+                                   at + QPointF(-gap - size.width(), -size.height()),
+                                   at + QPointF(gap, 2),
+                                   at + QPointF(-gap - size.width(), 2),
+                                   at + QPointF(-size.width() / 2, -gap - size.height()),
+                                   at + QPointF(-size.width() / 2, gap)};
+        for (const QPointF& corner : corners) {
+            const QRectF r(corner, size);
+            if (!area.contains(r) ||
+                std::any_of(blocked.begin(), blocked.end(), [&](const QRectF& b) { return b.intersects(r); }))
+                continue;
+            blocked.push_back(r);
+            m_labelRects.push_back(r);
+            // A light halo keeps the text readable over the mesh.
+            p.setPen(QColor(255, 255, 255, 200));
+            for (const QPointF& d : {QPointF(-1, 0), QPointF(1, 0), QPointF(0, -1), QPointF(0, 1)})
+                p.drawText(r.translated(d), Qt::AlignCenter, f.name);
+            p.setPen(QColor(20, 20, 20));
+            p.drawText(r, Qt::AlignCenter, f.name);
+            return;
+        }
+    };
+    p.save();
+    for (bool selected : {true, false})
+        for (const CZoMapOverlay& o : m_overlays) {
+            if (!o.visible || !o.labels)
+                continue;
+            for (const CZoMapFeature& f : o.features)
+                if (!f.name.isEmpty() && (o.selected != 0 && f.number == o.selected) == selected)
+                    place(o, f);
+        }
     p.restore();
 }
 

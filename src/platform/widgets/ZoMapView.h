@@ -101,6 +101,11 @@ public:
     MeshDraw LastMeshDraw() const { return m_lastDraw; }
     // Draws the whole frame (what a repaint shows) with the painter.
     void Render(QPainter& painter);
+    // What the last frame showed: the labels drawn (those that collided with another label,
+    // the legend or the scale bar were left out), the legend's box and the scale bar's text.
+    const std::vector<QRectF>& LabelRects() const { return m_labelRects; }
+    const QRect& LegendRect() const { return m_legendRect; }
+    const QString& ScaleBarText() const { return m_scaleText; }
 
 signals:
     void featureClicked(int overlay, int number);
@@ -125,6 +130,9 @@ private:
     void DrawElements(QPainter& p, const QRectF& view);
     void DrawLegend(QPainter& p);
     void DrawOverlays(QPainter& p);
+    void DrawLabels(QPainter& p);
+    // Returns the rectangle the bar took.
+    QRect DrawScaleBar(QPainter& p);
     void ViewChanged();
 
     MeshPtr m_mesh;
@@ -147,4 +155,8 @@ private:
     QPoint m_pressPos, m_lastPos;
     bool m_pressed = false, m_dragging = false;
     MeshDraw m_lastDraw = MeshDraw::kNone;
+    std::vector<QRectF> m_labelRects;
+    QRect m_legendRect;
+    QRect m_scaleRect;
+    QString m_scaleText;
 };

@@ -100,7 +100,7 @@ void CZoSEDlgBase::UpdateDoc(int hint) {
 
 void CZoSEDlgBase::ShowHelp() {
     if (m_host)
-        m_host->ShowHelp(GetHelpID());
+        m_host->ShowHelp(CurrentHelpID());
 }
 
 void CZoSEDlgBase::AddAlignRight(QWidget*) {}

@@ -55,8 +55,10 @@ public:
     // The host refreshes the dialog (SetData) before this returns, and must not delete the
     // dialog inside the call (deleteLater).
     void UpdateDoc(int hint);
-    // The help command (also F1): shows the topic of the dialog's help id.
-    virtual void ShowHelp();
+    // The help command (also F1): shows the topic of what the dialog shows now.
+    void ShowHelp();
+    // The topic of what the dialog shows now: its help id, or a page's on a sheet of pages.
+    virtual unsigned long CurrentHelpID() const { return GetHelpID(); }
     // Selects another node in the editor's tree ("Go to..." links).
     void SelectTreeItem(CZoSEKivBase* node);
     // A path relative to the setup file made absolute; unchanged without a host.
@@ -66,6 +68,10 @@ public:
     // Layout helpers of the framework; Qt layouts do the work.
     void AddAlignRight(QWidget* widget);
     void HideCaption(int hide);
+
+signals:
+    // Another page is on show, so CurrentHelpID may have changed.
+    void helpTopicChanged();
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;

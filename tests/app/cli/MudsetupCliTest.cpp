@@ -1,4 +1,8 @@
 // The command line run as a user runs it: exit codes, standard output and error, files.
+#include "common/FileNames.h"
+#include "datafile/ZoFileSelector.h"
+#include "paramfile/ParamFile.h"
+
 #include <gtest/gtest.h>
 
 #include <sys/stat.h>
@@ -8,6 +12,7 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <map>
 #include <sstream>
 #include <string>
 
@@ -108,6 +113,53 @@ TEST_F(Cli, FormatIsIdempotentAndKeepsValues) {
     EXPECT_EQ(ReadFile(dir / "once.setup"), once);
     Result toStdout = Mudsetup("format " + P("once.setup") + " -o -");
     EXPECT_EQ(toStdout.out, once);
+}
+
+// Every file name a setup holds, by its place (sections, keyword, value number), with the
+// file it stands for; names no folder changes as they are written.
+std::map<std::string, std::string> FilesNamedBy(const fs::path& setup) {
+    paramfile::ParseResult parsed = paramfile::ParseFile(setup.string());
+    std::map<std::string, std::string> out;
+    if (!parsed.document)
+        return out;
+    CZoFileSelector resolver;
+    resolver.SetBaseFolder(fs::absolute(setup).parent_path().lexically_normal().string());
+    auto walk = [&](auto& self, const paramfile::Section& s, const std::string& path) -> void {
+        for (int i = 0; i < s.EntryCount(); ++i) {
+            if (s.EntryIsSection(i)) {
+                self(self, s.SectionAt(i), path + "/" + std::string(s.SectionAt(i).Name()));
+                continue;
+            }
+            const paramfile::Keyword& k = s.KeywordAt(i);
+            for (int j = 0; j < k.ParamCount(); ++j) {
+                std::string name;
+                if (k.ParamAt(j).Type() == paramfile::ParamType::FileName && k.ParamAt(j).AsString(name))
+                    out[path + "/" + std::string(k.Name()) + "#" + std::to_string(j)] =
+                        name.empty() || IsAbsoluteFileName(name) ? name : resolver.AbsolutePath(name);
+            }
+        }
+    };
+    walk(walk, parsed.document->Root(), "");
+    return out;
+}
+
+TEST_F(Cli, FormatIntoAnotherFolderKeepsTheFilesTheSetupNames) {
+    fs::create_directories(dir / "project");
+    fs::copy(MUD_SOURCE_DIR "/examples", dir / "project", fs::copy_options::recursive);
+    // A section of another module names files too.
+    std::ofstream(dir / "project" / "estuary.setup", std::ios::app)
+        << "SPECTRAL_WAVES_MODULE {\n    bathymetry = 'data\\dredger_1.qrd0', 'estuary.2dm'\n"
+           "    spectra = '/srv/north.qrd0', 'C:\\runs\\wind.qrd0'\n}\n";
+    const fs::path input = dir / "project" / "estuary.setup";
+    const std::map<std::string, std::string> named = FilesNamedBy(input);
+    ASSERT_GE(named.size(), 12u);
+
+    fs::create_directories(dir / "runs" / "april");
+    Result r = Mudsetup("format " + input.string() + " -o " + P("runs/april/moved.setup"));
+    ASSERT_EQ(r.exitCode, 0) << r.err;
+    EXPECT_EQ(FilesNamedBy(dir / "runs" / "april" / "moved.setup"), named);
+    r = Mudsetup("validate " + P("runs/april/moved.setup"));
+    EXPECT_EQ(r.exitCode, 0) << r.out << r.err;
 }
 
 TEST_F(Cli, WarningsGoToStandardErrorAndTheFileStillLoads) {
@@ -212,10 +264,10 @@ TEST_F(Cli, InputThatIsNoSetupFileIsRefused) {
         std::string input;
         const char* why;
     } cases[] = {
-        {"/dev/zero", "not a regular file"},
-        {P("fifo"), "not a regular file"},
-        {P("folder"), "Is a directory"},
-        {P("huge.setup"), "larger than 2147483646 bytes"},
+        {"/dev/zero", "is not a regular file (a character device)"},
+        {P("fifo"), "is not a regular file (a FIFO)"},
+        {P("folder"), "is a folder"},
+        {P("huge.setup"), "is 3.0 GB; setup files are read up to 2.0 GB"},
         {P("nowhere.setup"), "No such file or directory"},
     };
     for (const auto& c : cases) {
@@ -285,7 +337,7 @@ TEST_F(Cli, OutputGoesOnlyWhereASetupBelongs) {
         SCOPED_TRACE(output);
         r = Mudsetup("format " + P("real.setup") + " -o " + output, "timeout 20 ");
         EXPECT_EQ(r.exitCode, 2);
-        EXPECT_NE(r.err.find("cannot write '" + output + "': not a regular file"),
+        EXPECT_NE(r.err.find("cannot write '" + output + "': is not a regular file"),
                   std::string::npos)
             << r.err;
     }

@@ -35,6 +35,7 @@
 #include <QTest>
 #include <QTextBrowser>
 #include <QTreeWidget>
+#include <QUndoStack>
 
 #include <gtest/gtest.h>
 
@@ -124,7 +125,9 @@ protected:
 TEST_F(EditorTest, EverySectionOfTheExampleShowsItsForm) {
     ASSERT_TRUE(m_window->OpenFile(kExample));
     EXPECT_FALSE(m_window->IsModified());
-    EXPECT_EQ(m_window->Messages()->topLevelItemCount(), 0) << "warnings on reading the example";
+    // Opening validates: no warnings on reading the example, and nothing to say of it.
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
+    EXPECT_EQ(m_window->Messages()->topLevelItem(0)->text(0), "The setup is valid.");
 
     // The tree shows what the navigation walk shows, then the host data.
     size_t moduleNodes = 0;
@@ -294,6 +297,51 @@ TEST_F(EditorTest, BoundariesAndSourcesChangedOnTheirPagesAreFollowed) {
     EXPECT_EQ(Titles(back.document->GetSources()), Titles(doc.GetSources()));
 }
 
+TEST_F(EditorTest, SaveAsIntoAnotherFolderKeepsEveryFileTheSetupNames) {
+    ASSERT_TRUE(m_window->OpenFile(CopyOfExample()));
+    ASSERT_TRUE(m_window->SelectPath("DOMAIN"));
+    m_window->Document().GetSources()->GetItem(1)->Name("Renamed outfall");
+    m_window->UpdateDoc(nullptr, kHintValueChanged);
+    ASSERT_TRUE(m_window->IsModified());
+
+    ASSERT_TRUE(QDir(m_dir.path()).mkpath("runs/april"));
+    const QString moved = m_dir.filePath("runs/april/moved.setup");
+    ASSERT_TRUE(m_window->SaveFile(moved));
+    EXPECT_FALSE(m_window->IsModified());
+    const QByteArray text = ReadAll(moved);
+    EXPECT_TRUE(text.contains("mesh_file = '../../estuary.2dm'\n"));
+    EXPECT_TRUE(text.contains("file_name = '../../data/dredger_1.qrd0'\n"));
+    // The form shows the name as saved, the files are found from the new folder, and no undo
+    // brings back names that were right only from the old one.
+    EXPECT_EQ(m_window->Document().GetDomain()->MeshFile(), "../../estuary.2dm");
+    bool shown = false;
+    for (QLineEdit* edit : m_window->CurrentDialog()->findChildren<QLineEdit*>())
+        shown = shown || edit->text() == "../../estuary.2dm";
+    EXPECT_TRUE(shown);
+    QStringList listed;
+    for (int i = 0; i < m_window->Messages()->topLevelItemCount(); ++i)
+        listed << m_window->Messages()->topLevelItem(i)->text(0) + ": " + m_window->Messages()->topLevelItem(i)->text(1);
+    EXPECT_EQ(listed, QStringList{"The setup is valid.: "});
+    EXPECT_FALSE(m_window->UndoStack()->canUndo());
+    EXPECT_EQ(m_window->Document().GetSources()->GetItem(1)->Name(), "Renamed outfall");
+    ASSERT_TRUE(m_window->SaveFile(moved));
+    EXPECT_EQ(ReadAll(moved), text);
+
+    // The same setup opened where its files are not: the missing mesh is listed at once.
+    ASSERT_TRUE(QDir(m_dir.path()).mkpath("lost"));
+    const QString lost = m_dir.filePath("lost/moved.setup");
+    ASSERT_TRUE(QFile::copy(moved, lost));
+    ASSERT_TRUE(m_window->OpenFile(lost));
+    QStringList messages;
+    for (int i = 0; i < m_window->Messages()->topLevelItemCount(); ++i)
+        messages << m_window->Messages()->topLevelItem(i)->text(1);
+    ASSERT_FALSE(messages.isEmpty());
+    EXPECT_TRUE(messages[0].startsWith("The mesh cannot be read: " +
+                                       QDir::cleanPath(m_dir.path() + "/../estuary.2dm")))
+        << messages.join("\n").toStdString();
+    EXPECT_FALSE(m_window->IsModified());
+}
+
 TEST_F(EditorTest, ASyntaxErrorLeavesTheOpenSetupAsItWas) {
     ASSERT_TRUE(m_window->OpenFile(CopyOfExample()));
     CSetupDocument* before = &m_window->Document();
@@ -387,7 +435,10 @@ TEST_F(EditorTest, WarningsFromReadingAreListed) {
     const QString path = m_dir.filePath("odd.setup");
     ASSERT_TRUE(WriteAll(path, text));
     ASSERT_TRUE(m_window->OpenFile(path));
-    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
+    // The one warning of reading comes first, then what validation says.
+    ASSERT_GE(m_window->Messages()->topLevelItemCount(), 1);
+    for (int i = 1; i < m_window->Messages()->topLevelItemCount(); ++i)
+        EXPECT_FALSE(m_window->Messages()->topLevelItem(i)->text(1).startsWith("warning: "));
     QTreeWidgetItem* w = m_window->Messages()->topLevelItem(0);
     EXPECT_TRUE(w->text(0).startsWith(path + ":")) << w->text(0).toStdString();
     EXPECT_TRUE(w->text(1).startsWith("warning: ")) << w->text(1).toStdString();
@@ -401,7 +452,8 @@ TEST_F(EditorTest, ContentNoSectionReadsIsListedAndSavingItAwayIsAskedOnce) {
     const QString path = m_dir.filePath("newer.setup");
     ASSERT_TRUE(WriteAll(path, text));
     ASSERT_TRUE(m_window->OpenFile(path));
-    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 1);
+    // Opening validates: the warning, then the verdict.
+    ASSERT_EQ(m_window->Messages()->topLevelItemCount(), 2);
     EXPECT_TRUE(m_window->Messages()->topLevelItem(0)->text(1).contains("unknown section 'PARTICLE_TRACKING'"));
     // Validation keeps the warnings of reading above its own messages.
     m_window->Validate();
@@ -542,5 +594,8 @@ TEST_F(EditorTest, ScreenshotsNeedNoDisplay) {
     EXPECT_EQ(run({"--screenshot", m_dir.filePath("y.png"), bad}, &err), 2);
     EXPECT_TRUE(err.contains(bad + ":")) << err.toStdString();
     EXPECT_FALSE(QFile::exists(m_dir.filePath("x.png")));
+    // The picture is written as every file is: never over a folder or a device.
+    EXPECT_EQ(run({"--screenshot", "/dev/null", kExample}, &err), 2);
+    EXPECT_TRUE(err.contains("cannot write '/dev/null': is not a regular file")) << err.toStdString();
 }
 #endif

@@ -538,8 +538,8 @@ protected:
 TEST_F(ParamFileFiles, WritesAtomicallyAndReadsBack) {
     const std::string path = (dir_ / "setup.par").string();
     std::string error;
-    ASSERT_TRUE(WriteFileAtomic(path, "A {\n    x = 1\n}\n", &error)) << error;
-    ASSERT_TRUE(WriteFileAtomic(path, "B {\n}\n", &error)) << error;
+    ASSERT_TRUE(fileio::WriteFileAtomic(path, "A {\n    x = 1\n}\n", &error)) << error;
+    ASSERT_TRUE(fileio::WriteFileAtomic(path, "B {\n}\n", &error)) << error;
     EXPECT_EQ(Read(path), "B {\n}\n");
     EXPECT_EQ(FileCount(), 1u); // no temporary left behind
 
@@ -554,15 +554,15 @@ TEST_F(ParamFileFiles, FailedWriteLeavesTargetAndSaysWhy) {
     std::filesystem::create_directory(target);
     std::ofstream(target / "keep") << "kept";
     std::string error;
-    EXPECT_FALSE(WriteFileAtomic(target.string(), "A {\n}\n", &error));
-    EXPECT_EQ(error, Join("cannot write '", target.string(), "': Is a directory"));
+    EXPECT_FALSE(fileio::WriteFileAtomic(target.string(), "A {\n}\n", &error));
+    EXPECT_EQ(error, Join("cannot write '", target.string(), "': is a folder"));
     EXPECT_EQ(Read(target / "keep"), "kept");
     EXPECT_EQ(FileCount(), 1u);
 
     const std::string missing = (dir_ / "no" / "such.par").string();
-    EXPECT_FALSE(WriteFileAtomic(missing, "x", &error));
+    EXPECT_FALSE(fileio::WriteFileAtomic(missing, "x", &error));
     EXPECT_EQ(error, Join("cannot write '", missing, "': No such file or directory"));
-    EXPECT_FALSE(WriteFileAtomic(missing, "x", nullptr));
+    EXPECT_FALSE(fileio::WriteFileAtomic(missing, "x", nullptr));
 }
 
 TEST_F(ParamFileFiles, UnreadableFileGivesErrorAtLineZero) {
@@ -574,7 +574,7 @@ TEST_F(ParamFileFiles, UnreadableFileGivesErrorAtLineZero) {
               Join(path, ":0:0: cannot read '", path, "': No such file or directory"));
     const ParseResult d = ParseFile(dir_.string());
     ASSERT_TRUE(d.error);
-    EXPECT_NE(d.error->message.find("Is a directory"), std::string::npos);
+    EXPECT_NE(d.error->message.find("is a folder"), std::string::npos);
 }
 
 // --- random documents --------------------------------------------------------------------

@@ -12,7 +12,9 @@
 #include "widgets/GisNavigationDlg.h"
 
 #include <QImage>
+#include <QLineF>
 #include <QPainter>
+#include <QRegularExpression>
 #include <QSignalSpy>
 #include <QTest>
 
@@ -120,6 +122,40 @@ TEST_F(MapFixture, HitTestsAndClicksNameTheFeature) {
     ASSERT_EQ(clicked.size(), 1);
     EXPECT_EQ(clicked[0][0].toInt(), points);
     EXPECT_EQ(clicked[0][1].toInt(), 8);
+}
+
+// Labels never cover each other, the legend or the scale bar: crowded ones thin out and the
+// highlighted feature's label comes first. The scale bar names a round length.
+TEST_F(MapFixture, LabelsAvoidEachOtherAndTheLegendAndAScaleBarIsDrawn) {
+    const int layer = view.AddOverlay("Points", Qt::blue);
+    for (int i = 1; i <= 8; ++i)
+        ASSERT_TRUE(view.AddPoint(layer, i, QStringLiteral("Station number %1").arg(i), 510000 + i, 5950000,
+                                  "UTM-32"));
+    // One under the legend, in the bottom right corner.
+    const QPointF corner = view.ToWorld(QPointF(view.width() - 30, view.height() - 30));
+    ASSERT_TRUE(view.AddPoint(layer, 9, "Hidden by the legend", corner.x(), corner.y(), "UTM-32"));
+    view.SelectFeature(layer, 8);
+    Draw(view);
+
+    const std::vector<QRectF>& labels = view.LabelRects();
+    ASSERT_FALSE(labels.empty());
+    EXPECT_LT(labels.size(), 9u);
+    EXPECT_FALSE(view.LegendRect().isNull());
+    for (size_t i = 0; i < labels.size(); ++i) {
+        EXPECT_TRUE(QRectF(view.rect()).contains(labels[i]));
+        EXPECT_FALSE(labels[i].intersects(view.LegendRect()));
+        for (size_t j = i + 1; j < labels.size(); ++j)
+            EXPECT_FALSE(labels[i].intersects(labels[j])) << i << " and " << j;
+    }
+    // The highlighted station's label is placed first, beside its point.
+    const QPointF selected = view.ToPixel(510008, 5950000);
+    EXPECT_LT(QLineF(labels[0].center(), selected).length(), 120);
+
+    const QString scale = view.ScaleBarText();
+    EXPECT_TRUE(QRegularExpression("^[125]0* k?m$").match(scale).hasMatch()) << scale.toStdString();
+    view.ZoomBy(4, QPointF(400, 250));
+    Draw(view);
+    EXPECT_NE(view.ScaleBarText(), scale);
 }
 
 TEST_F(MapFixture, PanZoomAndViewRectangles) {
