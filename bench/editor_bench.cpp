@@ -3,6 +3,7 @@
 // times are wall-clock medians of repeated runs.
 #include "EditorWindow.h"
 #include "PreferencesDialog.h"
+#include "SetupHistory.h"
 #include "core/MudTransportModuleKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "fem/BoundaryNamesKiv.h"
@@ -46,31 +47,56 @@ std::string LargeSetup(int n) {
     return doc.ToText();
 }
 
-// One stored change as a form makes it, recorded on the undo stack, then undone and redone.
-void MeasureUndo(CEditorWindow& window, const char* name) {
-    constexpr int kRuns = 60;
+struct Times {
     std::vector<double> record, undo, redo;
-    CSimulationPeriodKiv* period = window.Document().GetPeriod();
-    for (int i = 0; i < kRuns; ++i) {
-        period->TimeStepCount(1000 + i);
+};
+
+void PrintRow(const char* setup, const char* edit, size_t bytes, const Times& t) {
+    auto worst = [](const std::vector<double>& v) { return v.empty() ? 0.0 : *std::max_element(v.begin(), v.end()); };
+    std::printf("| %s | %s | %zu | %.2f | %.2f | %.2f | %.2f | %.2f | %.2f |\n", setup, edit, bytes,
+                Median(t.record), worst(t.record), Median(t.undo), worst(t.undo), Median(t.redo), worst(t.redo));
+}
+
+template <class Edit>
+Times Measure(CEditorWindow& window, int runs, Edit edit) {
+    Times t;
+    for (int i = 0; i < runs; ++i) {
+        edit(i);
         auto t0 = Clock::now();
-        window.UpdateDoc(nullptr, 1);
-        record.push_back(Ms(Clock::now() - t0));
+        window.UpdateDoc(window.CurrentDialog(), 1);
+        t.record.push_back(Ms(Clock::now() - t0));
     }
-    for (int i = 0; i < kRuns / 2; ++i) {
+    for (int i = 0; i < runs; ++i) {
         auto t0 = Clock::now();
         window.Undo();
-        undo.push_back(Ms(Clock::now() - t0));
+        t.undo.push_back(Ms(Clock::now() - t0));
     }
-    for (int i = 0; i < kRuns / 2; ++i) {
+    for (int i = 0; i < runs; ++i) {
         auto t0 = Clock::now();
         window.Redo();
-        redo.push_back(Ms(Clock::now() - t0));
+        t.redo.push_back(Ms(Clock::now() - t0));
     }
+    return t;
+}
+
+// Stored changes as a form makes them (a value, and the number of fractions, which changes
+// every per-fraction list), recorded for undo, then undone and redone; the history's memory
+// after 100 value edits.
+void MeasureUndo(CEditorWindow& window, const char* name) {
     const size_t bytes = window.Document().ToText().size();
-    std::printf("| %s | %zu | %.2f | %.2f | %.2f | %.2f | %d |\n", name, bytes, Median(record),
-                *std::max_element(record.begin(), record.end()), Median(undo), Median(redo),
-                window.UndoStack()->undoLimit());
+    window.SelectPath("SIMULATION_PERIOD");
+    CSimulationPeriodKiv* period = window.Document().GetPeriod();
+    PrintRow(name, "value", bytes, Measure(window, 30, [&](int i) { period->TimeStepCount(1000 + i); }));
+    window.SelectPath("MUD_TRANSPORT_MODULE/MODEL_DEFINITION");
+    CParameterSelectionKiv* model = ModelDefinition(window.Document().Module());
+    PrintRow(name, "fractions", bytes, Measure(window, 4, [&](int i) { model->NumberOfFractions(i % 2 ? 8 : 7); }));
+    window.SelectPath("SIMULATION_PERIOD");
+    for (int i = 0; i < 100; ++i) {
+        period->TimeStepCount(5000 + i);
+        window.UpdateDoc(window.CurrentDialog(), 1);
+    }
+    std::printf("| %s | history after 100 value edits: %.3f MB, %d steps |  |  |  |  |  |  |  |\n", name,
+                window.History().MemoryBytes() / 1048576.0, window.UndoStack()->count());
 }
 
 void MeasureForms(CEditorWindow& window) {
@@ -118,8 +144,8 @@ int main(int argc, char** argv) {
     QApplication app(argc, argv);
     const QString example = QStringLiteral(MUD_SOURCE_DIR "/examples/estuary.setup");
 
-    std::printf("| setup | text bytes | record ms (median) | record ms (worst) | undo ms | redo ms | history limit |\n");
-    std::printf("|---|---|---|---|---|---|---|\n");
+    std::printf("| setup | edit | text bytes | record ms | worst | undo ms | worst | redo ms | worst |\n");
+    std::printf("|---|---|---|---|---|---|---|---|---|\n");
     {
         CEditorWindow window;
         window.show();

@@ -4,6 +4,7 @@
 #include "HelpTopics.h"
 #include "HostDataPages.h"
 #include "PreferencesDialog.h"
+#include "SetupHistory.h"
 #include "core/MudTransportModuleKiv.h"
 #include "core/ParameterSelectionKiv.h"
 #include "fem/BoundaryNamesKiv.h"
@@ -115,12 +116,6 @@ bool AskNewSetup(QWidget* parent, int& fractions, int& layers) {
     return true;
 }
 
-// How many stored changes can be undone: each keeps one text of the setup (the state before
-// is the previous change's state after), so the history is bounded by a memory budget, and
-// a large setup keeps fewer steps, at least kMinUndoSteps.
-constexpr int kMaxUndoSteps = 200;
-constexpr int kMinUndoSteps = 20;
-constexpr size_t kUndoBudgetBytes = size_t(64) << 20;
 // Quiet validation waits this long after the last stored change.
 constexpr int kRevalidateDelayMs = 400;
 
@@ -129,27 +124,6 @@ QString Plural(int n, const char* one, const char* many) {
 }
 
 }  // namespace
-
-// One stored change: the setup's text before and after it. The first redo is the change
-// itself, already made.
-class CSnapshotCommand : public QUndoCommand {
-public:
-    CSnapshotCommand(CEditorWindow* window, const QString& name, std::shared_ptr<const std::string> before,
-                     std::shared_ptr<const std::string> after)
-        : QUndoCommand(name), m_window(window), m_before(std::move(before)), m_after(std::move(after)) {}
-    void undo() override { m_window->RestoreState(m_before); }
-    void redo() override {
-        if (m_done)
-            m_window->RestoreState(m_after);
-        m_done = true;
-    }
-
-private:
-    CEditorWindow* m_window;
-    std::shared_ptr<const std::string> m_before;
-    std::shared_ptr<const std::string> m_after;
-    bool m_done = false;
-};
 
 // A line edit claims Ctrl+Z and Ctrl+Y for its own typing even when it has nothing to take
 // back, and forms are full of them: then the keys are the setup's undo and redo.
@@ -179,6 +153,8 @@ CEditorWindow::CEditorWindow(QWidget* parent) : QMainWindow(parent) {
     ZoInstallWheelGuard();
     qApp->installEventFilter(new CUndoKeys(this));
     m_undo = new QUndoStack(this);
+    m_history = std::make_unique<CSetupHistory>(
+        m_undo, [this](const std::function<void()>& change, bool structural) { RestoreState(change, structural); });
     connect(m_undo, &QUndoStack::cleanChanged, this, [this](bool clean) { SetModified(!clean); });
     m_revalidate = new QTimer(this);
     m_revalidate->setSingleShot(true);
@@ -393,6 +369,7 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
     m_doc = std::move(doc);
     m_doc->SetTreeItemSelector([this](CZoSEKivBase* node) { SelectTreeItem(node); });
     m_path = path;
+    StartNewHistory();
     m_entries.clear();
     m_moduleItems.clear();
     m_hostItems.clear();
@@ -402,7 +379,6 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
         m_tree->clear();
     }
     RebuildTree();
-    StartNewHistory();
     if (QTreeWidgetItem* first = m_tree->topLevelItem(0))
         m_tree->setCurrentItem(first);
 }
@@ -410,34 +386,20 @@ void CEditorWindow::SetDocument(std::unique_ptr<CSetupDocument> doc, const QStri
 // --- undo --------------------------------------------------------------------------------
 
 void CEditorWindow::StartNewHistory() {
-    m_undo->clear();
-    m_state = std::make_shared<const std::string>(m_doc->ToText());
-    const size_t steps = kUndoBudgetBytes / std::max<size_t>(m_state->size(), 1);
-    m_undo->setUndoLimit(static_cast<int>(std::clamp<size_t>(steps, kMinUndoSteps, kMaxUndoSteps)));
-    m_undo->setClean();
+    m_history->Start(m_doc.get());
     SetModified(false);
 }
 
 void CEditorWindow::RecordChange(CZoSEDlgBase* dialog, int hint) {
-    auto after = std::make_shared<const std::string>(m_doc->ToText());
-    if (m_state && *after == *m_state)
-        return;  // nothing that the file holds changed
-    if (!m_state) {
-        m_state = after;
-        return;
-    }
-    m_undo->push(new CSnapshotCommand(this, EditName(dialog, hint), m_state, after));
-    m_state = std::move(after);
+    // Only the calling form's own node is sure to be alive.
+    CZoSEKivBase* edited = dialog ? dialog->GetSection() : nullptr;
+    m_history->Record(edited, hint, [&] { return EditName(dialog, hint); });
 }
 
 void CEditorWindow::SyncState(const QString& name) {
     if (m_restoring)
         return;
-    auto now = std::make_shared<const std::string>(m_doc->ToText());
-    if (m_state && *now != *m_state) {
-        m_undo->push(new CSnapshotCommand(this, name, m_state, now));
-        m_state = std::move(now);
-    }
+    m_history->Record(m_currentNode, kHintValueChanged, [&] { return name; });
 }
 
 void CEditorWindow::Undo() {
@@ -450,9 +412,7 @@ void CEditorWindow::Redo() {
     m_undo->redo();
 }
 
-void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state) {
-    if (!state || (m_state && *state == *m_state))
-        return;
+void CEditorWindow::RestoreState(const std::function<void()>& change, bool structural) {
     // The form is shown again for the same place in the tree, which may be a new node.
     const CString path = m_currentNode ? NodePath(m_currentNode) : CString();
     const bool hadNode = m_currentNode != nullptr;
@@ -460,17 +420,16 @@ void CEditorWindow::RestoreState(const std::shared_ptr<const std::string>& state
     // Deleted later: the keys of the undo may still be on their way through the form.
     CloseDialog(false);
     m_currentNode = nullptr;
-    if (!m_doc->Restore(*state)) {
-        m_restoring = false;
-        return;  // texts come from ToText: cannot happen
-    }
-    m_state = state;
-    ShowAgain(path, hadNode);
+    change();
+    ShowAgain(path, hadNode, structural);
 }
 
-void CEditorWindow::ShowAgain(const CString& path, bool hadNode) {
+void CEditorWindow::ShowAgain(const CString& path, bool hadNode, bool rebuild) {
     m_restoring = true;
-    RebuildTree();
+    if (rebuild)
+        RebuildTree();
+    else
+        RefreshTree();
     CZoSEKivBase* target = nullptr;
     if (hadNode)
         for (CZoSEKivBase* node : ShownNodes())
@@ -650,6 +609,8 @@ bool CEditorWindow::SaveFile(const QString& path) {
     }
     std::string error;
     bool changed = false;
+    // Saving may rewrite file names; the text before tells (saving writes it whole anyway).
+    const std::string before = m_doc->ToText();
     bool saved = m_doc->SaveAs(path.toStdString(), &error, &changed);
     if (!saved && changed) {
         const QMessageBox::StandardButton answer =
@@ -673,7 +634,7 @@ bool CEditorWindow::SaveFile(const QString& path) {
     // The file now holds what the setup holds: what reading said of the old one is past
     // (the list shows it until the next validation).
     m_readWarnings.clear();
-    if (m_state && m_doc->ToText() != *m_state) {
+    if (m_doc->ToText() != before) {
         // Saved into another folder, relative file names were rewritten to name the same
         // files from there: the form shows the new names, the states before hold the old
         // ones (no longer right from here), and the files are checked from the new place.
@@ -721,9 +682,9 @@ bool CEditorWindow::RunValidation(bool quiet) {
     const bool valid = ok && m_doc->Errors().empty();
     FillMessages(valid);
     // Validation may correct values silently; they count as a change of their own.
-    const std::string before = m_state ? *m_state : std::string();
+    const int before = m_undo->index();
     SyncState(tr("Corrections by validation"));
-    const bool corrected = m_state && *m_state != before;
+    const bool corrected = m_undo->index() != before;
     RefreshTree();
     if (m_dialog && (!quiet || corrected))
         m_dialog->SetData();
@@ -1037,6 +998,7 @@ void CEditorWindow::ShowHelpOfSelection() {
 void CEditorWindow::ShowNode(CZoSEKivBase* node) {
     CloseDialog(false);
     m_currentNode = node;
+    m_history->Watch(node);
     m_paneTitle->setText(TitleOf(node));
     m_panePath->setText(Q(NodePath(node)));
 
@@ -1132,6 +1094,7 @@ void CEditorWindow::UpdateDoc(CZoSEDlgBase* dialog, int hint) {
         return;
     RecordChange(dialog, hint);
     RefreshTree();
+    m_history->Watch(m_currentNode);
     if (m_dialog && !m_initializing)
         m_dialog->SetData();
     m_revalidate->start();

@@ -18,6 +18,7 @@ class QAction;
 class QLabel;
 class QTimer;
 class QUndoStack;
+class CSetupHistory;
 class QMenu;
 class QScrollArea;
 class QTextBrowser;
@@ -34,8 +35,9 @@ public:
     // --- the document ---------------------------------------------------------------
     CSetupDocument& Document() const { return *m_doc; }
     bool IsModified() const { return m_modified; }
-    // Every stored change, as the setup's text before and after it.
+    // Every stored change.
     QUndoStack* UndoStack() const { return m_undo; }
+    CSetupHistory& History() const { return *m_history; }
     // Undo and redo as the menu does them: a field being edited stores its value first.
     void Undo();
     void Redo();
@@ -110,11 +112,11 @@ private:
     void RecordChange(CZoSEDlgBase* dialog, int hint);
     // Names the edit in the Undo menu: the field's label, a button's text, a grid's operation.
     QString EditName(CZoSEDlgBase* dialog, int hint) const;
-    // Makes the document the state of the text (undo, redo); the form follows.
-    void RestoreState(const std::shared_ptr<const std::string>& state);
-    // The tree and the form again after the nodes were read anew; the form of the node at
-    // path when there was one.
-    void ShowAgain(const CString& path, bool hadNode);
+    // Runs a change of the history (undo, redo); the tree and the form follow.
+    void RestoreState(const std::function<void()>& change, bool structural);
+    // The tree and the form again after the nodes were read anew (or only their values, when
+    // rebuild is false); the form of the node at path when there was one.
+    void ShowAgain(const CString& path, bool hadNode, bool rebuild = true);
     // Takes in changes that were made without an update hint (validation corrects some).
     void SyncState(const QString& name);
     void StartNewHistory();
@@ -156,11 +158,9 @@ private:
     void AddRecentFile(const QString& path);
     void UpdateRecentMenu();
 
-    friend class CSnapshotCommand;
-
     std::unique_ptr<CSetupDocument> m_doc;
     QUndoStack* m_undo = nullptr;
-    std::shared_ptr<const std::string> m_state;  // the document's text as last recorded
+    std::unique_ptr<CSetupHistory> m_history;
     bool m_restoring = false;
     QTimer* m_revalidate = nullptr;
     QString m_path;

@@ -111,6 +111,64 @@ bool CSetupDocument::Restore(const std::string& text) {
     return true;
 }
 
+std::string CSetupDocument::NodeText(CZoSEKivBase* node) {
+    paramfile::Document out;
+    paramfile::Builder builder(out);
+    node->Save(&builder);
+    return paramfile::WriteText(out);
+}
+
+bool CSetupDocument::RestoreNode(CZoSEKivBase* node, const std::string& text) {
+    paramfile::ParseResult parsed = paramfile::ParseText(text, {});
+    if (parsed.error)
+        return false;
+    node->Load(const_cast<paramfile::Section*>(&parsed.document->Root()));
+    return true;
+}
+
+std::vector<int> CSetupDocument::PlaceOf(const CZoSEKivBase* node) {
+    std::vector<int> place;
+    for (; node && node != this; node = node->GetParent()) {
+        CZoSEKivBase* parent = node->GetParent();
+        if (!parent)
+            return {};
+        std::optional<int> index;
+        POSITION pos = 0;
+        int i = 0;
+        for (CZoSEKivBase* c = parent->GetFirstChild(pos); c && !index; c = parent->GetNextChild(pos), ++i)
+            if (c == node)
+                index = i;
+        for (int p = 0; p < parent->GetPropertyCount() && !index; ++p)
+            if (parent->GetProperty(p) == node)
+                index = -(p + 1);
+        if (!index)
+            return {};
+        place.push_back(*index);
+    }
+    if (node != this)
+        return {};
+    std::reverse(place.begin(), place.end());
+    return place;
+}
+
+CZoSEKivBase* CSetupDocument::NodeAt(const std::vector<int>& place) {
+    CZoSEKivBase* node = this;
+    for (int index : place) {
+        if (index < 0) {
+            node = node->GetProperty(-index - 1);
+        } else {
+            POSITION pos = 0;
+            CZoSEKivBase* c = node->GetFirstChild(pos);
+            for (int i = 0; c && i < index; ++i)
+                c = node->GetNextChild(pos);
+            node = c;
+        }
+        if (!node)
+            return nullptr;
+    }
+    return node;
+}
+
 CZoSEKivBase* CSetupDocument::OwnerOf(std::string_view sectionName) {
     POSITION pos = 0;
     for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))

@@ -43,6 +43,15 @@ public:
     // sections of other modules stay as read. False, and nothing changed, when the text does
     // not parse.
     bool Restore(const std::string& text);
+    // One node's part of the text, written on its own (no comments of the file): the undo
+    // history keeps these for edits that stay within a node.
+    static std::string NodeText(CZoSEKivBase* node);
+    // Reads text that NodeText wrote back into the same node; false when it does not parse.
+    static bool RestoreNode(CZoSEKivBase* node, const std::string& text);
+    // A node's place as positions among its parents' children (properties count from -1
+    // down), valid while the tree keeps its shape; empty for a node outside this document.
+    std::vector<int> PlaceOf(const CZoSEKivBase* node);
+    CZoSEKivBase* NodeAt(const std::vector<int>& place);
     // Atomic: on failure the file on disk and this document stay as they were. Saved into
     // another folder, every relative file name is rewritten to name the same file from there
     // (in the file and in the nodes, RebasedFileName). Saving to the file that was read

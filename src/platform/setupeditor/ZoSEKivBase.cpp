@@ -41,6 +41,7 @@ void CZoSEKivBase::SwapChilds(int first, int second) {
     if (first < 0 || second < 0 || first >= n || second >= n)
         return;
     std::swap(m_children[first], m_children[second]);
+    TellShapeChanged();
     m_children[first]->m_positionHint = first + 1;
     m_children[second]->m_positionHint = second + 1;
 }
@@ -133,6 +134,11 @@ void CZoSEKivBase::Load(void* h) {
     POSITION pos = 0;
     for (CZoSEKivBase* c = GetFirstChild(pos); c; c = GetNextChild(pos))
         c->Load(section);
+}
+
+void CZoSEKivBase::TellShapeChanged() {
+    if (m_root)
+        m_root->NoteShapeChange();
 }
 
 void CZoSEKivBase::SaveSize(void*) {}

@@ -95,6 +95,7 @@ public:
 
 protected:
     const std::vector<CZoSEKivBase*>& Children() const { return m_children; }
+    void TellShapeChanged();
     // Deletes children and properties, last first, while this node is still whole.
     void DeleteChildren();
     CZoSEKivGlobalBase* m_root = nullptr;
@@ -145,6 +146,11 @@ public:
     // simulation (a spectral-wave one) runs alongside; 0 otherwise.
     virtual int DecoupledSimulation() const { return 0; }
 
+    // Counts changes of the tree's shape (items added, removed or moved), so that the undo
+    // history can tell an edit of values from one that remade nodes.
+    unsigned long ShapeChanges() const { return m_shapeChanges; }
+    void NoteShapeChange() { ++m_shapeChanges; }
+
 private:
     struct Entry {
         CString key;
@@ -152,6 +158,7 @@ private:
     };
     std::vector<Entry> m_registry;
     std::vector<ErrorEntry> m_errors;
+    unsigned long m_shapeChanges = 0;
 };
 
 // Typed registry look-up; the key's owner guarantees the type.

@@ -65,6 +65,8 @@ public:
             return;
         }
         const size_t target = static_cast<size_t>(std::max(count, 0));
+        if (m_items.size() != target)
+            this->TellShapeChanged();
         // Each item leaves the list before it is deleted.
         while (m_items.size() > target) {
             T* last = m_items.back();
@@ -92,6 +94,7 @@ public:
             T* item = m_items[index - 1];
             m_items.erase(m_items.begin() + (index - 1));
             m_numberingDirty = true;
+            this->TellShapeChanged();
             delete item;
         }
         for (const NodeInListOfSyncedLists& r : SyncedCopy())
@@ -109,6 +112,7 @@ public:
             T* item = Create();
             m_items.insert(m_items.begin() + (index - 1), item);
             m_numberingDirty = true;
+            this->TellShapeChanged();
             if (GetHasBeenTouched())
                 TouchAllChildren();
         }
@@ -292,6 +296,7 @@ private:
 
     void SwapItems(int a, int b) {
         std::swap(m_items[a - 1], m_items[b - 1]);
+        this->TellShapeChanged();
         m_items[a - 1]->m_positionHint = a;
         m_items[b - 1]->m_positionHint = b;
     }
